@@ -1,0 +1,1 @@
+// Intentionally empty: libConfiguration.so is ConfigurationCore linked whole.

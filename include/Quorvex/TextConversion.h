@@ -1,0 +1,16 @@
+// Text conversions. The library's strings are 8-bit; the local code page is ISO-8859-1.
+// Pure functions; thread-safe.
+#pragma once
+
+#include <ace/SString.h>
+
+namespace Quorvex {
+
+// UTF-8 to the local 8-bit code page; a character it cannot hold, or a malformed UTF-8 sequence,
+// becomes '?'.
+void ConvertUTF8StringToAnsi(const ACE_CString& utf8, ACE_CString& ansi);
+// Replaces the XML character entities (&lt; &gt; &amp; &quot; &apos; and &#N; / &#xN; up to 255)
+// by their characters; anything else is kept as it stands.
+void ConvertXmlStringToString(const ACE_CString& xml, ACE_CString& text);
+
+}  // namespace Quorvex
