@@ -1,0 +1,193 @@
+// ConfigDoc bookkeeping and the stored form of documents.
+#include "DocumentCodec.h"
+
+#include <gtest/gtest.h>
+#include <pugixml.hpp>
+#include <zlib.h>
+
+#include <map>
+
+#include "Configuration/AnonParam.h"
+#include "Configuration/DocumentNames.h"
+#include "Configuration/TypedConfigDoc.h"
+#include "FakeMachine.h"
+#include "Fields.h"
+#include "Quorvex/Machine.h"
+
+namespace Configuration {
+namespace {
+
+// A small document with a nested object.
+class TestDoc : public TypedConfigDoc<TestDoc> {
+public:
+    TestDoc() : TypedConfigDoc(ConfigDoc::getConfigurationRegistryPath() + "TestDoc", false) {}
+    bool readVesk(const Vesk::Element& e) override {
+        return Fields::read(*this, e, "TestDoc", Fields::FailureForm::Failed);
+    }
+    Quorvex::auto_ptr<Vesk::Element> writeVesk() const override {
+        return Fields::write(*this, "TestDoc");
+    }
+    friend bool operator==(const TestDoc& a, const TestDoc& b) { return Fields::equal(a, b); }
+
+    ACE_CString name = "default";
+    unsigned int size = 5;
+    AnonParam param;
+
+private:
+    friend struct Fields::Access;
+    template <class Self, class Io>
+    static void fields(Self& s, Io& io) {
+        io("Name", s.name);
+        io("Size", s.size);
+        io("AnonParam", s.param);
+    }
+};
+
+// An in-memory store keyed by path.
+struct MemoryStore {
+    struct Item {
+        std::string bytes;
+        BDateTime timestamp;
+    };
+    std::map<std::string, Item> items;
+    int storeResult = 0;
+
+    DocumentCodec::StoreFunction store() {
+        return [this](const ACE_CString&, const ACE_CString& path, const unsigned char* b,
+                      std::size_t n, const BDateTime& ts) {
+            if (storeResult == 0) {
+                items[path.c_str()] = Item{std::string(reinterpret_cast<const char*>(b), n), ts};
+            }
+            return storeResult;
+        };
+    }
+    DocumentCodec::RetrieveFunction retrieve() {
+        return [this](const ACE_CString&, const ACE_CString& path, Quorvex::ByteArray& b,
+                      std::size_t& n, BDateTime& ts) {
+            auto it = items.find(path.c_str());
+            if (it == items.end()) {
+                return -1;
+            }
+            n = it->second.bytes.size();
+            b.reset(new unsigned char[n]);
+            std::copy(it->second.bytes.begin(), it->second.bytes.end(), b.get());
+            ts = it->second.timestamp;
+            return 0;
+        };
+    }
+};
+
+class DocumentCodecTest : public ::testing::Test {
+protected:
+    Quorvex::Testing::FakeMachine machine;
+    Quorvex::ScopedMachine scoped{machine};
+    MemoryStore store;
+};
+
+TEST(ConfigDocBasics, FreshDocumentAndStrictNewer) {
+    TestDoc a;
+    EXPECT_EQ(a.version(), 0);
+    EXPECT_FALSE(a.isNewer(a));
+    TestDoc b;
+    b.timestamp(BDateTime("2010-03-04T05:06:07.089"));
+    a.timestamp(BDateTime("2010-03-04T05:06:07.089"));
+    EXPECT_FALSE(a.isNewer(b));
+    EXPECT_FALSE(b.isNewer(a));
+    a.timestamp(BDateTime("2010-03-04T05:06:07.090"));
+    EXPECT_TRUE(a.isNewer(b));
+    EXPECT_FALSE(b.isNewer(a));
+}
+
+TEST(ConfigDocBasics, RegistryPrefixIsOneObjectEndingInBackslash) {
+    EXPECT_EQ(&ConfigDoc::getConfigurationRegistryPath(), &ConfigDoc::getConfigurationRegistryPath());
+    EXPECT_EQ(ConfigDoc::getConfigurationRegistryPath(), "BrimmetServer\\");
+    EXPECT_EQ(TestDoc().path(), "BrimmetServer\\TestDoc");
+    EXPECT_EQ(ACE_CString(DocumentNames::kHeartbeat), "Heartbeat");
+    EXPECT_EQ(&ConfigDoc::getLocalHostName(), &ConfigDoc::getLocalHostName());
+}
+
+TEST(ConfigDocBasics, CloneAndAssignFromCopyTheDerivedPart) {
+    TestDoc a;
+    a.name = "copied";
+    a.timestamp(BDateTime("2011-01-01T00:00:00.000"));
+    std::unique_ptr<ConfigDoc> copy(a.clone());
+    TestDoc b;
+    b.assignFrom(*copy);
+    EXPECT_TRUE(b == a);
+    EXPECT_EQ(b.timestamp(), a.timestamp());
+}
+
+TEST_F(DocumentCodecTest, WriteThenReadGivesEqualDocumentWithTheWriteTimestamp) {
+    TestDoc written;
+    written.name = "x<&>\"'\xE9";
+    written.param.setTag("0010,0010");
+    ASSERT_TRUE(DocumentCodec::writeItem("TestDoc", written, store.store()));
+    EXPECT_EQ(written.timestamp(), BDateTime::Now());
+    machine.advanceMilliseconds(60000);
+    TestDoc read;
+    EXPECT_EQ(DocumentCodec::readItem("TestDoc", read, store.retrieve()), 0);
+    EXPECT_TRUE(read == written);
+    EXPECT_EQ(read.timestamp(), written.timestamp());
+}
+
+TEST_F(DocumentCodecTest, StoredBytesInflateWithPlainZlibToXmlAStandardParserAccepts) {
+    TestDoc doc;
+    DocumentCodec::writeItem("TestDoc", doc, store.store());
+    const std::string& bytes = store.items.begin()->second.bytes;
+    std::vector<unsigned char> text(1 << 16);
+    uLongf len = text.size();
+    ASSERT_EQ(uncompress(text.data(), &len, reinterpret_cast<const Bytef*>(bytes.data()),
+                         bytes.size()),
+              Z_OK);
+    pugi::xml_document parsed;
+    EXPECT_TRUE(parsed.load_buffer(text.data(), len));
+}
+
+TEST_F(DocumentCodecTest, FailedStoreReturnsNullButKeepsTheNewTimestamp) {
+    store.storeResult = -1;
+    TestDoc doc;
+    EXPECT_FALSE(DocumentCodec::writeItem("TestDoc", doc, store.store()));
+    EXPECT_EQ(doc.timestamp(), BDateTime::Now());
+}
+
+TEST_F(DocumentCodecTest, RetrieveFailureIsMinusOne) {
+    TestDoc doc;
+    EXPECT_EQ(DocumentCodec::readItem("TestDoc", doc, store.retrieve()), -1);
+}
+
+TEST_F(DocumentCodecTest, MissingKeyThrowsErrorParsingNamingThePath) {
+    TestDoc written;
+    written.size = 77;
+    DocumentCodec::writeItem("TestDoc", written, store.store());
+    // Replace the stored document by one that lacks "Name".
+    Quorvex::auto_ptr<Vesk::Element> tree = written.writeVesk();
+    Vesk::Element partial("TestDoc", -1);
+    Vesk::MultiElementValue& children = partial.addMultiElement();
+    for (const Vesk::Element& child : tree->getMultiElement()) {
+        if (!(child.key() == "Name")) {
+            children.addElement(child);
+        }
+    }
+    store.items.begin()->second.bytes = StoredForm::encode(partial);
+    TestDoc read;
+    try {
+        DocumentCodec::readItem("TestDoc", read, store.retrieve());
+        FAIL() << "no exception";
+    } catch (const std::exception& e) {
+        EXPECT_STREQ(e.what(),
+                     "ConfigurationRepository::ReadItem: Error parsing configuration: "
+                     "BrimmetServer\\TestDoc\n");
+    }
+    EXPECT_EQ(read.size, 77u);  // the keys that were there were read
+}
+
+TEST_F(DocumentCodecTest, CorruptBytesThrow) {
+    TestDoc doc;
+    DocumentCodec::writeItem("TestDoc", doc, store.store());
+    std::string& bytes = store.items.begin()->second.bytes;
+    bytes.resize(bytes.size() / 2);
+    EXPECT_THROW(DocumentCodec::readItem("TestDoc", doc, store.retrieve()), std::exception);
+}
+
+}  // namespace
+}  // namespace Configuration
