@@ -3,7 +3,7 @@
 
 #include <gtest/gtest.h>
 
-#include "LogCapture.h"
+#include "testing/LogCapture.h"
 
 namespace Configuration {
 namespace {

@@ -9,39 +9,15 @@
 
 #include "Configuration/AnonParam.h"
 #include "Configuration/DocumentNames.h"
-#include "Configuration/TypedConfigDoc.h"
-#include "FakeMachine.h"
-#include "Fields.h"
+#include "Configuration/StoredForm.h"
+#include "model/TestDocument.h"
+#include "testing/FakeMachine.h"
 #include "Quorvex/Machine.h"
 
 namespace Configuration {
 namespace {
 
-// A small document with a nested object.
-class TestDoc : public TypedConfigDoc<TestDoc> {
-public:
-    TestDoc() : TypedConfigDoc(ConfigDoc::getConfigurationRegistryPath() + "TestDoc", false) {}
-    bool readVesk(const Vesk::Element& e) override {
-        return Fields::read(*this, e, "TestDoc", Fields::FailureForm::Failed);
-    }
-    Quorvex::auto_ptr<Vesk::Element> writeVesk() const override {
-        return Fields::write(*this, "TestDoc");
-    }
-    friend bool operator==(const TestDoc& a, const TestDoc& b) { return Fields::equal(a, b); }
-
-    ACE_CString name = "default";
-    unsigned int size = 5;
-    AnonParam param;
-
-private:
-    friend struct Fields::Access;
-    template <class Self, class Io>
-    static void fields(Self& s, Io& io) {
-        io("Name", s.name);
-        io("Size", s.size);
-        io("AnonParam", s.param);
-    }
-};
+using TestDoc = Testing::TestDocument;
 
 // An in-memory store keyed by path.
 struct MemoryStore {

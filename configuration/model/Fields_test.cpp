@@ -3,7 +3,7 @@
 
 #include "Configuration/AnonParam.h"
 #include "Fields.h"
-#include "LogCapture.h"
+#include "testing/LogCapture.h"
 
 namespace Configuration {
 namespace {

@@ -5,7 +5,8 @@
 // ("2010-03-04T05:06:07.0890000-00:00", the offset applied), a trailing "Z", fewer fraction
 // digits, and no fraction. Text that does not parse, and the default constructor, give the
 // invalid value: isValid() false, equal to every other invalid value and earlier than every
-// valid one.
+// valid one. Valid values lie in the years 0000-9999 (so each has its text form); parsing,
+// fromMillisecondsSinceEpoch and arithmetic that leave that range give the invalid value.
 #pragma once
 
 #include <ace/SString.h>

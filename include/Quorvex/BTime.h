@@ -1,6 +1,7 @@
 // BTime: a time of day or a duration, with millisecond precision. Value type; thread-safe to copy.
 // Text form "HH:MM:SS" with ".mmm" appended when the milliseconds are not zero; hours may exceed
-// 23 for durations. Text that does not parse gives an invalid value (isValid() false, zero length).
+// 23 for durations (at most nine hour digits). Text that does not parse gives an invalid value
+// (isValid() false, zero length).
 #pragma once
 
 #include <ace/SString.h>

@@ -12,7 +12,9 @@ ACE_CString GetHostName(bool fullyQualified);
 // The first non-loopback IPv4 address; returns 0 on success, non-zero on failure.
 int GetLocalIPAddress(ACE_CString& address);
 // Whether two host names name the same host: equal ignoring case, or one is the short form of
-// the other's fully qualified name ("orvel1" and "ORVEL1.site.local").
+// the other's fully qualified name ("orvel1" and "ORVEL1.site.local"). Two different qualified
+// names differ ("a.x", "a.y"); a dotted IPv4 address has no short form; an empty name matches
+// nothing.
 bool HostNamesEquivalent(const ACE_CString& a, const ACE_CString& b);
 // The machine's logical drives ("C:\", ...); empty on Linux.
 std::vector<ACE_CString> GetLogicalDriveList();

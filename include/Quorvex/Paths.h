@@ -6,16 +6,23 @@
 
 namespace Quorvex {
 
-// The drive element of a path with its separator: "C:\" for "C:\a\b", "\\server\share\" for a UNC
-// path, "/" for an absolute Linux path, empty when there is none.
+// Both '\' and '/' are read as separators; a separator these functions add is always '\'.
+
+// The drive element of a path with its separator: "C:\" for "C:\a\b" (and for "C:"),
+// "\\server\share\" for a UNC path, "/" for an absolute Linux path, "\" for a rooted one, empty
+// for a relative path.
 ACE_CString getDriveElement(const ACE_CString& path);
 // Everything but the last element, without a trailing separator: "C:\a\b\" and "C:\a\b" give
-// "C:\a"; a lone drive gives itself without its separator.
+// "C:\a", "C:\a" gives "C:"; a lone drive gives itself without its separator ("C:\" gives "C:",
+// "/" gives ""); a single relative element gives "".
 ACE_CString getAllButLastPathElement(const ACE_CString& path);
-// Joins two paths with exactly one separator between them.
+// Joins two paths with exactly one '\' between them, b taken as relative to a ("C:\" and "x\"
+// give "C:\x\"); an empty side gives the other unchanged.
 ACE_CString concatPath(const ACE_CString& a, const ACE_CString& b);
 // Turns '/' into '\', folds repeated separators (keeping a leading "\\" of a UNC path), and
-// resolves "." and ".." elements; a trailing separator is kept.
+// resolves "." and ".." elements; a trailing separator is kept. ".." never climbs above a drive or
+// UNC share (it is dropped) but is kept at the start of a relative path; a relative path that
+// resolves to nothing gives ".".
 ACE_CString normalizePath(const ACE_CString& path);
 
 }  // namespace Quorvex

@@ -7,10 +7,11 @@
 namespace Quorvex {
 
 // UTF-8 to the local 8-bit code page; a character it cannot hold, or a malformed UTF-8 sequence,
-// becomes '?'.
+// becomes '?' (one '?' per character, or per broken start of one). Throws std::runtime_error only
+// when the system cannot convert at all (no iconv converter).
 void ConvertUTF8StringToAnsi(const ACE_CString& utf8, ACE_CString& ansi);
-// Replaces the XML character entities (&lt; &gt; &amp; &quot; &apos; and &#N; / &#xN; up to 255)
-// by their characters; anything else is kept as it stands.
+// Replaces the XML character entities (&lt; &gt; &amp; &quot; &apos; and &#N; / &#xN; from 1 to
+// 255) by their characters; anything else is kept as it stands.
 void ConvertXmlStringToString(const ACE_CString& xml, ACE_CString& text);
 
 }  // namespace Quorvex

@@ -1,0 +1,149 @@
+// FakeService / FakeConnector: configuration services held in memory for repository tests. Each
+// fake counts its requests and can be made unreachable. Test support only; not thread-safe
+// except where noted.
+#pragma once
+
+#include <ace/OS_NS_strings.h>
+
+#include <atomic>
+#include <cstring>
+#include <map>
+#include <stdexcept>
+#include <string>
+
+#include "repository/ServiceConnection.h"
+
+namespace Configuration {
+namespace Testing {
+
+struct FakeService {
+    struct Item {
+        std::string bytes;
+        std::string time;
+    };
+    std::string name;                             // the host name the service reports
+    std::map<std::pair<std::string, std::string>, Item> items;  // (host, name)
+    std::vector<ACE_CString> hosts;               // answer of listHosts
+    bool down = false;
+    std::atomic<int> retrieves{0}, timestamps{0}, stores{0}, changed{0}, refreshes{0},
+        restarts{0};
+    std::vector<std::string> registrations;
+
+    void check() const {
+        if (down) {
+            throw std::runtime_error("service " + name + " unreachable");
+        }
+    }
+    const Item& find(const ACE_CString& host, const ACE_CString& n) const {
+        const auto it = items.find({host.c_str(), n.c_str()});
+        if (it == items.end()) {
+            throw std::runtime_error("No configuration found in response");
+        }
+        return it->second;
+    }
+    // Puts an item as the service would store it, with a time text.
+    void put(const std::string& host, const std::string& n, const std::string& bytes,
+             const std::string& time) {
+        items[{host, n}] = Item{bytes, time};
+    }
+};
+
+class FakeConnection : public ServiceConnection {
+public:
+    explicit FakeConnection(FakeService& s) : m_s(s) { m_s.check(); m_name = s.name.c_str(); }
+    const ACE_CString& hostName() const override { return m_name; }
+    void retrieve(const ACE_CString& host, const ACE_CString& n, Quorvex::ByteArray& data,
+                  std::size_t& length) override {
+        m_s.check();
+        ++m_s.retrieves;
+        const std::string& b = m_s.find(host, n).bytes;
+        length = b.size();
+        data.reset(new unsigned char[b.size() + 1]);
+        std::memcpy(data.get(), b.data(), b.size());
+    }
+    void store(const ACE_CString& host, const ACE_CString& n, const unsigned char* data,
+               std::size_t length, const ACE_CString& time) override {
+        m_s.check();
+        ++m_s.stores;
+        const std::string t = time.length() > 0 ? time.c_str() : nextTime();
+        m_s.put(host.c_str(), n.c_str(), std::string(reinterpret_cast<const char*>(data), length),
+                t);
+    }
+    void getTimeStamp(const ACE_CString& host, const ACE_CString& n, BDateTime& ts) override {
+        m_s.check();
+        ++m_s.timestamps;
+        ts = BDateTime(m_s.find(host, n).time.c_str());
+    }
+    void listHosts(std::vector<ACE_CString>& hosts) override {
+        m_s.check();
+        hosts = m_s.hosts;
+    }
+    void listItems(const ACE_CString& host, std::vector<_HttpConfigurationItemInfo>& out) override {
+        m_s.check();
+        out.clear();
+        for (const auto& [key, item] : m_s.items) {
+            if (host == "*" || ACE_OS::strcasecmp(key.first.c_str(), host.c_str()) == 0) {
+                out.push_back({key.first.c_str(), key.second.c_str(), item.time.c_str()});
+            }
+        }
+    }
+    void registerService(const ACE_CString& host, const ACE_CString& service,
+                         const ACE_CString& connection) override {
+        m_s.check();
+        m_s.registrations.push_back(std::string(host.c_str()) + "|" + service.c_str() + "|" +
+                                    connection.c_str());
+    }
+    void switchoverPersistent(const ACE_CString&) override { m_s.check(); }
+    void enableMergeNetworkCapture(bool, const ACE_CString&) override { m_s.check(); }
+    void signalChanged() override {
+        m_s.check();
+        ++m_s.changed;
+    }
+    void signalRestart() override {
+        m_s.check();
+        ++m_s.restarts;
+    }
+    void signalRefresh() override {
+        m_s.check();
+        ++m_s.refreshes;
+    }
+
+private:
+    // A store without a time gets a fresh, distinct one, as the real service does.
+    static std::string nextTime() {
+        static std::atomic<int> counter{0};
+        char text[40];
+        std::snprintf(text, sizeof text, "2020-01-01T00:00:%02d.%03d", (counter / 1000) % 60,
+                      counter % 1000);
+        ++counter;
+        return text;
+    }
+    FakeService& m_s;
+    ACE_CString m_name;
+};
+
+// Connects by host name (ignoring case); the local host is the one named at construction.
+class FakeConnector : public ServiceConnector {
+public:
+    explicit FakeConnector(std::string localHost) : m_local(std::move(localHost)) {}
+    void add(const std::string& host, FakeService& service) { m_services[lower(host)] = &service; }
+    std::unique_ptr<ServiceConnection> connectLocal() const override { return connect(m_local.c_str()); }
+    std::unique_ptr<ServiceConnection> connect(const ACE_CString& host) const override {
+        const auto it = m_services.find(lower(host.c_str()));
+        if (it == m_services.end()) {
+            throw std::runtime_error(std::string("unknown host ") + host.c_str());
+        }
+        return std::make_unique<FakeConnection>(*it->second);
+    }
+
+private:
+    static std::string lower(std::string s) {
+        for (char& c : s) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+        return s;
+    }
+    std::string m_local;
+    std::map<std::string, FakeService*> m_services;
+};
+
+}  // namespace Testing
+}  // namespace Configuration
