@@ -65,6 +65,8 @@ public:
         return const_key_iterator(m_children.end(), m_children.end(), key);
     }
     std::size_t size() const { return m_children.size(); }
+    // Makes room for n children in all (a hint for readers that know the count).
+    void reserve(std::size_t n) { m_children.reserve(n); }
 
     std::unique_ptr<Value> clone() const override;
     bool equals(const Value& other) const override;
@@ -74,3 +76,6 @@ private:
 };
 
 }  // namespace Vesk
+
+// The inline iterators above need Element complete; this makes the header usable on its own.
+#include "Vesk/Element.h"  // IWYU pragma: export

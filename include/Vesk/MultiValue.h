@@ -25,12 +25,14 @@ public:
     SingleValue& addSingle();
     MultiValue& addMulti();
     MultiElementValue& addMultiElement();
-    // Appends a value, taking ownership.
+    // Appends a value, taking ownership (null is refused with TrelException).
     void addValue(std::unique_ptr<Value> value);
 
     const_iterator begin() const { return const_iterator(m_values.begin()); }
     const_iterator end() const { return const_iterator(m_values.end()); }
     std::size_t size() const { return m_values.size(); }
+    // Makes room for n values in all (a hint for readers that know the count).
+    void reserve(std::size_t n) { m_values.reserve(n); }
 
     std::unique_ptr<Value> clone() const override;
     bool equals(const Value& other) const override;

@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "Quorvex/OutputStream.h"
+#include "Vesk/TrelException.h"
 #include "Vesk/XmlAttributes.h"
 
 namespace Vesk {

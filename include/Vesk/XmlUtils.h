@@ -9,6 +9,7 @@
 #include <ace/SString.h>
 
 #include <cstddef>
+#include <string>
 
 #include "Quorvex/InputStream.h"
 #include "Quorvex/OutputStream.h"

@@ -1,0 +1,13 @@
+#include "Vesk/SingleValue.h"
+
+namespace Vesk {
+
+std::unique_ptr<Value> SingleValue::clone() const {
+    return std::make_unique<SingleValue>(*this);
+}
+
+bool SingleValue::equals(const Value& other) const {
+    return other.kind() == Kind::Single && m_text == static_cast<const SingleValue&>(other).m_text;
+}
+
+}  // namespace Vesk

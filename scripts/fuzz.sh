@@ -1,0 +1,22 @@
+#!/usr/bin/env bash
+# Builds the libFuzzer targets with clang and runs each for a bounded time (not part of CI).
+#   scripts/fuzz.sh [SECONDS_PER_TARGET] [TARGET...]     (default 60 s, every target)
+# Corpora are kept in fuzz-out/<target>/, crashes in fuzz-out/<target>-crashes/.
+set -euo pipefail
+root=$(cd "$(dirname "$0")/.." && pwd)
+seconds=${1:-60}
+shift || true
+targets=("$@")
+[ ${#targets[@]} -gt 0 ] || targets=(xml_reader_fuzz stored_form_decode_fuzz base64_decode_fuzz
+                                   date_parse_fuzz zstream_decode_fuzz)
+"$root/scripts/install-deps.sh"
+CC=clang CXX=clang++ "$root/scripts/build.sh" "$root/build-fuzz" -DQUORVEX_FUZZ=ON \
+  -DQUORVEX_TESTS=OFF -DQUORVEX_BENCH=OFF
+for t in "${targets[@]}"; do
+  corpus="$root/fuzz-out/$t"
+  crashes="$root/fuzz-out/$t-crashes"
+  mkdir -p "$corpus" "$crashes"
+  echo "=== $t for ${seconds}s"
+  "$root/build-fuzz/fuzz/$t" -max_total_time="$seconds" -max_len=65536 -rss_limit_mb=2048 \
+    -artifact_prefix="$crashes/" -print_final_stats=1 "$corpus" 2>&1 | tail -n 12
+done
