@@ -8,6 +8,7 @@
 #include <atomic>
 #include <cstring>
 #include <map>
+#include <mutex>
 #include <stdexcept>
 #include <string>
 
@@ -24,12 +25,13 @@ struct FakeService {
     std::string name;                             // the host name the service reports
     std::map<std::pair<std::string, std::string>, Item> items;  // (host, name)
     std::vector<ACE_CString> hosts;               // answer of listHosts
-    bool down = false;
+    std::atomic<bool> down{false};
+    std::mutex mutex;  // guards items and registrations
     std::atomic<int> retrieves{0}, timestamps{0}, stores{0}, changed{0}, refreshes{0},
         restarts{0};
     std::vector<std::string> registrations;
 
-    void check() const {
+    void check() {
         if (down) {
             throw std::runtime_error("service " + name + " unreachable");
         }
@@ -55,6 +57,7 @@ public:
     void retrieve(const ACE_CString& host, const ACE_CString& n, Quorvex::ByteArray& data,
                   std::size_t& length) override {
         m_s.check();
+        std::lock_guard<std::mutex> guard(m_s.mutex);
         ++m_s.retrieves;
         const std::string& b = m_s.find(host, n).bytes;
         length = b.size();
@@ -64,6 +67,7 @@ public:
     void store(const ACE_CString& host, const ACE_CString& n, const unsigned char* data,
                std::size_t length, const ACE_CString& time) override {
         m_s.check();
+        std::lock_guard<std::mutex> guard(m_s.mutex);
         ++m_s.stores;
         const std::string t = time.length() > 0 ? time.c_str() : nextTime();
         m_s.put(host.c_str(), n.c_str(), std::string(reinterpret_cast<const char*>(data), length),
@@ -71,6 +75,7 @@ public:
     }
     void getTimeStamp(const ACE_CString& host, const ACE_CString& n, BDateTime& ts) override {
         m_s.check();
+        std::lock_guard<std::mutex> guard(m_s.mutex);
         ++m_s.timestamps;
         ts = BDateTime(m_s.find(host, n).time.c_str());
     }
@@ -80,6 +85,7 @@ public:
     }
     void listItems(const ACE_CString& host, std::vector<_HttpConfigurationItemInfo>& out) override {
         m_s.check();
+        std::lock_guard<std::mutex> guard(m_s.mutex);
         out.clear();
         for (const auto& [key, item] : m_s.items) {
             if (host == "*" || ACE_OS::strcasecmp(key.first.c_str(), host.c_str()) == 0) {
@@ -90,6 +96,7 @@ public:
     void registerService(const ACE_CString& host, const ACE_CString& service,
                          const ACE_CString& connection) override {
         m_s.check();
+        std::lock_guard<std::mutex> guard(m_s.mutex);
         m_s.registrations.push_back(std::string(host.c_str()) + "|" + service.c_str() + "|" +
                                     connection.c_str());
     }

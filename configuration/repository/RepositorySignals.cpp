@@ -1,12 +1,9 @@
 // ConfigurationRepository: change signals and the copy of the master's documents to this host.
 #include <ace/OS_NS_strings.h>
 
-#include <algorithm>
-#include <iterator>
-#include <string>
-
 #include "Configuration/ConfigurationRepository.h"
 #include "Quorvex/Log.h"
+#include "repository/ItemDiff.h"
 #include "repository/ServiceConnection.h"
 
 namespace Configuration {
@@ -14,32 +11,6 @@ namespace {
 
 bool sameHost(const ACE_CString& a, const ACE_CString& b) {
     return ACE_OS::strcasecmp(a.c_str(), b.c_str()) == 0;
-}
-
-// Host, configuration name and last-modified time joined: equal keys mean the same version of
-// the same item.
-std::string itemKey(const _HttpConfigurationItemInfo& item) {
-    std::string key(item.host.c_str(), item.host.length());
-    key.push_back('\0');
-    key.append(item.configurationName.c_str(), item.configurationName.length());
-    key.push_back('\0');
-    key.append(item.lastModifiedTime.c_str(), item.lastModifiedTime.length());
-    return key;
-}
-
-bool keyLess(const _HttpConfigurationItemInfo& a, const _HttpConfigurationItemInfo& b) {
-    return itemKey(a) < itemKey(b);
-}
-
-// The master's items whose key the local list lacks: missing locally, or of another time.
-std::vector<_HttpConfigurationItemInfo> missingLocally(
-    std::vector<_HttpConfigurationItemInfo> master, std::vector<_HttpConfigurationItemInfo> local) {
-    std::sort(master.begin(), master.end(), keyLess);
-    std::sort(local.begin(), local.end(), keyLess);
-    std::vector<_HttpConfigurationItemInfo> missing;
-    std::set_difference(master.begin(), master.end(), local.begin(), local.end(),
-                        std::back_inserter(missing), keyLess);
-    return missing;
 }
 
 }  // namespace
@@ -109,7 +80,7 @@ int ConfigurationRepository::CacheMasterWebToLocalWeb() {
         std::vector<_HttpConfigurationItemInfo> localItems;
         master->listItems("*", masterItems);
         local->listItems("*", localItems);
-        missing = missingLocally(std::move(masterItems), std::move(localItems));
+        missing = itemsMissingLocally(std::move(masterItems), std::move(localItems));
     } catch (const std::exception& e) {
         QUORVEX_LOG(LM_ERROR,
                     "ConfigurationRepository::CacheMasterWebToLocalWeb: Unable to list the "

@@ -1,5 +1,6 @@
 #include "repository/StoreServiceConnection.h"
 
+#include <cctype>
 #include <cstring>
 #include <stdexcept>
 #include <string>
@@ -82,7 +83,11 @@ void StoreServiceConnection::switchoverPersistent(const ACE_CString& persistentN
 }
 
 void StoreServiceConnection::enableMergeNetworkCapture(bool enable, const ACE_CString& host) {
-    m_store->setSetting(ACE_CString("MergeNetworkCapture\\") + host, enable ? "1" : "0");
+    std::string key = "MergeNetworkCapture:";
+    for (const char* c = host.c_str(); *c != '\0'; ++c) {
+        key.push_back(static_cast<char>(std::tolower(static_cast<unsigned char>(*c))));
+    }
+    m_store->setSetting(key.c_str(), enable ? "1" : "0");
 }
 
 void StoreServiceConnection::signalChanged() {

@@ -1,0 +1,120 @@
+// The repository's cost, in one run against a configuration service on loopback:
+//   - a cached read (GetLatest of a small document already in the cache), 1 and 2 threads;
+//   - a cold read (GetLatest of a document not yet cached: timestamp + retrieve + decode + read);
+//   - a bare retrieve with the HTTP client alone (one request), for scale.
+// cold / bare shows what the repository adds on top of the transport.
+#include <benchmark/benchmark.h>
+
+#include <memory>
+#include <string>
+
+#include "Configuration/AnonParam.h"
+#include "Configuration/ConfigurationRepository.h"
+#include "Configuration/HttpConfigurationClient.h"
+#include "Configuration/StoredForm.h"
+#include "Configuration/TypedConfigDoc.h"
+#include "InProcessService.h"
+#include "model/Fields.h"
+#include "repository/HttpServiceConnection.h"
+
+namespace {
+
+using namespace Configuration;
+
+constexpr int kColdDocuments = 3000;
+
+class SmallDoc : public TypedConfigDoc<SmallDoc> {
+public:
+    explicit SmallDoc(const std::string& name = "Small")
+        : TypedConfigDoc(ConfigDoc::getConfigurationRegistryPath() + name.c_str(), false) {}
+    bool readVesk(const Vesk::Element& e) override {
+        return Fields::read(*this, e, "Small", Fields::FailureForm::Failed);
+    }
+    Quorvex::auto_ptr<Vesk::Element> writeVesk() const override {
+        return Fields::write(*this, "Small");
+    }
+    ACE_CString host = "storage-node-01";
+    unsigned int port = 104;
+    bool enabled = true;
+    AnonParam param;
+
+private:
+    friend struct Fields::Access;
+    template <class Self, class Io>
+    static void fields(Self& s, Io& io) {
+        io("Host", s.host);
+        io("Port", s.port);
+        io("Enabled", s.enabled);
+        io("AnonParam", s.param);
+    }
+};
+
+struct World {
+    ServiceTesting::InProcessService service;
+    std::unique_ptr<HttpConfigurationClient> client;
+    std::unique_ptr<ConfigurationRepository> repository;
+    int nextCold = 0;
+
+    World() {
+        client = std::make_unique<HttpConfigurationClient>(service.address().c_str(), true, false);
+        const std::string bytes = StoredForm::encode(*SmallDoc().writeVesk());
+        const auto* data = reinterpret_cast<const unsigned char*>(bytes.data());
+        client->store("TestHost", "BrimmetServer\\Small", data, bytes.size(), "");
+        for (int i = 0; i < kColdDocuments; ++i) {
+            const std::string name = "BrimmetServer\\Cold" + std::to_string(i);
+            client->store("TestHost", name.c_str(), data, bytes.size(), "");
+        }
+        ServiceLocation location;
+        location.localServer = service.address().c_str();
+        location.servers["testhost"] = service.address();
+        repository = std::make_unique<ConfigurationRepository>(
+            std::make_shared<HttpServiceConnector>(location));
+        SmallDoc warm;
+        repository->GetLatest(warm);
+    }
+};
+
+World& world() {
+    static World w;
+    return w;
+}
+
+void BM_CachedGetLatest(benchmark::State& state) {
+    ConfigurationRepository& repository = *world().repository;
+    SmallDoc doc;
+    for (auto _ : state) {
+        if (repository.GetLatest(doc) != 0) {
+            state.SkipWithError("GetLatest failed");
+            break;
+        }
+    }
+}
+
+void BM_ColdGetLatest(benchmark::State& state) {
+    World& w = world();
+    for (auto _ : state) {
+        SmallDoc doc("Cold" + std::to_string(w.nextCold++ % kColdDocuments));
+        if (w.repository->GetLatest(doc) != 0) {
+            state.SkipWithError("GetLatest failed");
+            break;
+        }
+    }
+}
+
+void BM_BareClientRetrieve(benchmark::State& state) {
+    World& w = world();
+    for (auto _ : state) {
+        Quorvex::ByteArray bytes;
+        std::size_t length = 0;
+        w.client->retrieve("TestHost", "BrimmetServer\\Small", bytes, length);
+        benchmark::DoNotOptimize(length);
+    }
+}
+
+BENCHMARK(BM_CachedGetLatest)->Threads(1)->Threads(2)->UseRealTime();
+BENCHMARK(BM_ColdGetLatest)->Iterations(kColdDocuments)->Unit(benchmark::kMicrosecond);
+BENCHMARK(BM_BareClientRetrieve)->Iterations(2000)->Unit(benchmark::kMicrosecond);
+
+}  // namespace
+
+BENCHMARK_MAIN();

@@ -1,0 +1,155 @@
+#include "repository/HttpTransport.h"
+
+#include <curl/curl.h>
+
+#include <cstdlib>
+#include <string>
+
+#include "Quorvex/Log.h"
+#include "repository/HttpRoute.h"
+
+namespace Configuration {
+
+namespace {
+
+// libcurl's global set-up, done exactly once per process before the first handle.
+void initialiseCurl() {
+    static const CURLcode result = curl_global_init(CURL_GLOBAL_DEFAULT);
+    (void)result;
+}
+
+class EasyHandle {
+public:
+    EasyHandle() : m_handle(curl_easy_init()) {}
+    ~EasyHandle() {
+        if (m_handle != nullptr) {
+            curl_easy_cleanup(m_handle);
+        }
+    }
+    EasyHandle(const EasyHandle&) = delete;
+    EasyHandle& operator=(const EasyHandle&) = delete;
+    CURL* get() const { return m_handle; }
+
+private:
+    CURL* m_handle;
+};
+
+class HeaderList {
+public:
+    HeaderList() = default;
+    ~HeaderList() { curl_slist_free_all(m_list); }
+    HeaderList(const HeaderList&) = delete;
+    HeaderList& operator=(const HeaderList&) = delete;
+    void add(const std::string& line) { m_list = curl_slist_append(m_list, line.c_str()); }
+    curl_slist* get() const { return m_list; }
+
+private:
+    curl_slist* m_list = nullptr;
+};
+
+std::size_t collectBody(char* data, std::size_t size, std::size_t count, void* target) {
+    static_cast<ACE_CString*>(target)->append(data, size * count);
+    return size * count;
+}
+
+// "a=1; b=2": every cookie, in key order, values as they stand.
+std::string cookieLine(const HttpTransport::CookieMap& cookies) {
+    std::string line;
+    for (const auto& cookie : cookies) {
+        if (!line.empty()) {
+            line += "; ";
+        }
+        line.append(cookie.first.c_str(), cookie.first.length());
+        line += '=';
+        line.append(cookie.second.c_str(), cookie.second.length());
+    }
+    return line;
+}
+
+// The request headers: an explicit Content-Length and none of libcurl's defaults that the
+// services do not expect (no Expect: 100-continue round trip, no form content type).
+void setHeaders(HeaderList& headers, std::size_t bodyLength) {
+    headers.add("Content-Length: " + std::to_string(bodyLength));
+    headers.add("Expect:");
+    headers.add("Content-Type:");
+    headers.add("Accept:");
+}
+
+void setRoute(CURL* curl, const HttpRoute& route, HeaderList& connectTo) {
+    curl_easy_setopt(curl, CURLOPT_URL, route.url.c_str());
+    connectTo.add("::" + route.connectHost + ":" + std::to_string(route.connectPort));
+    curl_easy_setopt(curl, CURLOPT_CONNECT_TO, connectTo.get());
+    if (!route.requestTarget.empty()) {
+        curl_easy_setopt(curl, CURLOPT_REQUEST_TARGET, route.requestTarget.c_str());
+    }
+    curl_easy_setopt(curl, CURLOPT_SSL_VERIFYPEER, 1L);
+    curl_easy_setopt(curl, CURLOPT_SSL_VERIFYHOST, 2L);
+    if (const char* caFile = std::getenv(HttpTransport::CA_FILE_VARIABLE)) {
+        curl_easy_setopt(curl, CURLOPT_CAINFO, caFile);
+    }
+}
+
+void setConnectionPolicy(CURL* curl, long timeoutMs) {
+    curl_easy_setopt(curl, CURLOPT_NOSIGNAL, 1L);
+    curl_easy_setopt(curl, CURLOPT_PROXY, "");  // never through a proxy from the environment
+    curl_easy_setopt(curl, CURLOPT_PROTOCOLS_STR, "http,https");
+    curl_easy_setopt(curl, CURLOPT_HTTP_VERSION, static_cast<long>(CURL_HTTP_VERSION_1_1));
+    curl_easy_setopt(curl, CURLOPT_FRESH_CONNECT, 1L);
+    curl_easy_setopt(curl, CURLOPT_FORBID_REUSE, 1L);
+    curl_easy_setopt(curl, CURLOPT_TIMEOUT_MS, timeoutMs);
+}
+
+HttpTransport::Outcome failure(CURL* curl, CURLcode result, const char* detail,
+                               const std::string& url) {
+    long requestSize = 0;
+    curl_easy_getinfo(curl, CURLINFO_REQUEST_SIZE, &requestSize);
+    QUORVEX_LOG(LM_DEBUG, "HttpTransport::post: %s: %s (%s)\n", url.c_str(),
+                curl_easy_strerror(result), detail);
+    const bool sent = requestSize > 0 && result != CURLE_SEND_ERROR;
+    return sent ? HttpTransport::Outcome::NotReceived : HttpTransport::Outcome::NotSent;
+}
+
+}  // namespace
+
+HttpTransport::Outcome HttpTransport::post(const ACE_CString& server, const ACE_CString& url,
+                                           const ACE_CString& body, const CookieMap& cookies,
+                                           long timeoutMs, Answer& answer) {
+    initialiseCurl();
+    EasyHandle handle;
+    if (handle.get() == nullptr) {
+        return Outcome::NotSent;
+    }
+    CURL* curl = handle.get();
+    const HttpRoute route = RouteRequest(server.c_str(), std::string(url.c_str(), url.length()));
+    HeaderList connectTo;
+    setRoute(curl, route, connectTo);
+    setConnectionPolicy(curl, timeoutMs);
+
+    HeaderList headers;
+    setHeaders(headers, body.length());
+    curl_easy_setopt(curl, CURLOPT_HTTPHEADER, headers.get());
+    curl_easy_setopt(curl, CURLOPT_POST, 1L);
+    curl_easy_setopt(curl, CURLOPT_POSTFIELDS, body.c_str());
+    curl_easy_setopt(curl, CURLOPT_POSTFIELDSIZE_LARGE, static_cast<curl_off_t>(body.length()));
+    const std::string cookieText = cookieLine(cookies);
+    if (!cookieText.empty()) {
+        curl_easy_setopt(curl, CURLOPT_COOKIE, cookieText.c_str());
+    }
+
+    answer.body.clear();
+    curl_easy_setopt(curl, CURLOPT_WRITEFUNCTION, &collectBody);
+    curl_easy_setopt(curl, CURLOPT_WRITEDATA, &answer.body);
+    char error[CURL_ERROR_SIZE] = "";
+    curl_easy_setopt(curl, CURLOPT_ERRORBUFFER, error);
+
+    const CURLcode result = curl_easy_perform(curl);
+    if (result != CURLE_OK) {
+        return failure(curl, result, error, route.url);
+    }
+    long status = 0;
+    curl_easy_getinfo(curl, CURLINFO_RESPONSE_CODE, &status);
+    answer.statusCode = std::to_string(status).c_str();
+    return Outcome::Answered;
+}
+
+}  // namespace Configuration

@@ -1,0 +1,189 @@
+// The service ticket: the real libServerInterop.so module, its ticket file, and the cookie that
+// HttpConfigurationClient sends with it.
+#include <gtest/gtest.h>
+#include <sys/stat.h>
+
+#include <cstdio>
+#include <cstdlib>
+#include <fstream>
+
+#include "ServerInterop/ServerInteropAPI.h"
+#include "repository/HttpClientTestSupport.h"
+#include "repository/ServiceTicketModule.h"
+#include "testing/LogCapture.h"
+#include "testing/ScratchDir.h"
+
+namespace Configuration {
+namespace {
+
+using ServerInterop::ServerInteropAPI;
+using Testing::ScriptedResponse;
+
+const char* const TICKET = "Tk-8f1c2e0a9b7d";
+
+// Points the module at a ticket file in a scratch folder for the life of the object.
+class TicketFile {
+public:
+    TicketFile() : m_path(m_folder.file("service-ticket")) {
+        setenv(ServerInteropAPI::TICKET_FILE_VARIABLE, m_path.c_str(), 1);
+    }
+    ~TicketFile() { unsetenv(ServerInteropAPI::TICKET_FILE_VARIABLE); }
+
+    void write(const std::string& content, mode_t mode = 0600) {
+        std::ofstream(m_path, std::ios::binary | std::ios::trunc) << content;
+        chmod(m_path.c_str(), mode);
+    }
+
+private:
+    Quorvex::Testing::ScratchDir m_folder;
+    std::string m_path;
+};
+
+int fetch(ACE_CString& ticket) {
+    return ServiceTicketModule::process().fetch(ticket);
+}
+
+TEST(ServiceTicketModule, TheProcessLoadedTheModule) {
+    ASSERT_TRUE(ServiceTicketModule::process().loaded());
+}
+
+TEST(ServiceTicketModule, ReadsTheTicketWithoutTheLineBreak) {
+    TicketFile file;
+    file.write(std::string(TICKET) + "\r\n");
+    ACE_CString ticket("stale");
+    ASSERT_EQ(0, fetch(ticket));
+    EXPECT_STREQ(TICKET, ticket.c_str());
+}
+
+TEST(ServiceTicketModule, AMissingFileGivesNoTicket) {
+    TicketFile file;
+    ACE_CString ticket;
+    EXPECT_EQ(ServerInteropAPI::TICKET_FILE_MISSING, fetch(ticket));
+    EXPECT_TRUE(ticket.empty());
+}
+
+TEST(ServiceTicketModule, RefusesAFileOthersCanRead) {
+    TicketFile file;
+    for (mode_t mode : {0640, 0604, 0620, 0660}) {
+        file.write(TICKET, mode);
+        ACE_CString ticket;
+        EXPECT_EQ(ServerInteropAPI::TICKET_FILE_INSECURE, fetch(ticket)) << std::oct << mode;
+        EXPECT_TRUE(ticket.empty());
+    }
+}
+
+TEST(ServiceTicketModule, RefusesTextThatCannotBeACookieValue) {
+    TicketFile file;
+    for (const char* content : {"", "\n", "two words", "a;b=c", "x\ny"}) {
+        file.write(content);
+        ACE_CString ticket;
+        EXPECT_EQ(ServerInteropAPI::TICKET_MALFORMED, fetch(ticket)) << content;
+    }
+}
+
+TEST(ServiceTicketModule, AMissingModuleIsAnError) {
+    ServiceTicketModule module({"/nonexistent/libServerInterop.so"});
+    EXPECT_FALSE(module.loaded());
+    ACE_CString ticket;
+    try {
+        module.fetch(ticket);
+        FAIL();
+    } catch (const std::exception& e) {
+        EXPECT_STREQ("ServerInterop DLL is missing. Unable to get service ticket", e.what());
+    }
+}
+
+TEST(ServiceTicketModule, AModuleWithoutTheFunctionIsAnError) {
+    ServiceTicketModule module({"libz.so.1"});
+    ASSERT_TRUE(module.loaded());
+    ACE_CString ticket;
+    try {
+        module.fetch(ticket);
+        FAIL();
+    } catch (const std::exception& e) {
+        EXPECT_STREQ("Unable to export GetQuorvexServiceTicket from serverinterop.dll", e.what());
+    }
+}
+
+TEST(ServiceTicketModule, TheVariableOverridesTheSearch) {
+    setenv(ServiceTicketModule::LIBRARY_VARIABLE, "/opt/x/libServerInterop.so", 1);
+    EXPECT_EQ(std::vector<std::string>{"/opt/x/libServerInterop.so"},
+              ServiceTicketModule::defaultCandidates());
+    unsetenv(ServiceTicketModule::LIBRARY_VARIABLE);
+    const auto candidates = ServiceTicketModule::defaultCandidates();
+    ASSERT_LE(2u, candidates.size());
+    for (std::size_t i = 0; i + 1 < candidates.size(); ++i) {
+        EXPECT_EQ('/', candidates[i][0]) << candidates[i];
+        EXPECT_NE(std::string::npos, candidates[i].rfind("/libServerInterop.so"));
+    }
+    EXPECT_EQ("libServerInterop.so", candidates.back());
+}
+
+class ServiceTicketClient : public Testing::HttpClientTest {
+protected:
+    HttpConfigurationClient makeTicketClient() {
+        HttpConfigurationClient::CookieMap cookies;
+        cookies["OrvelWebApplication"] = "from-caller";
+        cookies["Lang"] = "de";
+        return HttpConfigurationClient(serverText(), true, false, cookies);
+    }
+
+    TicketFile m_file;
+};
+
+TEST_F(ServiceTicketClient, TheTicketBecomesTheCookieOfEveryRequest) {
+    m_file.write(TICKET);
+    server().clearRequests();
+    makeTicketClient().signalRefresh();
+    const auto requests = server().requests();
+    ASSERT_EQ(3u, requests.size());  // two host-name look-ups and the signal
+    for (const auto& request : requests) {
+        EXPECT_EQ(std::string("Lang=de; OrvelWebApplication=") + TICKET, request.header("Cookie"));
+    }
+}
+
+TEST_F(ServiceTicketClient, WithoutATicketTheClientGoesOnWithoutIt) {
+    makeTicketClient().signalRefresh();
+    EXPECT_EQ("Lang=de; OrvelWebApplication=from-caller", server().lastRequest().header("Cookie"));
+}
+
+TEST_F(ServiceTicketClient, AnInsecureTicketFileIsIgnored) {
+    m_file.write(TICKET, 0644);
+    makeTicketClient().signalRefresh();
+    EXPECT_EQ(std::string::npos, server().lastRequest().header("Cookie").find(TICKET));
+}
+
+TEST_F(ServiceTicketClient, TheTicketNeverReachesTheLog) {
+    m_file.write(TICKET);
+    Quorvex::Testing::LogCapture capture;
+    const HttpConfigurationClient client = makeTicketClient();
+    server().enqueue(ScriptedResponse::Close());
+    EXPECT_ANY_THROW(client.signalRefresh());
+    server().enqueue(
+        ScriptedResponse::Ok(Testing::LegacyFailure("<ErrorMessage>x</ErrorMessage>")));
+    EXPECT_ANY_THROW(client.signalRefresh());
+    EXPECT_FALSE(capture.containsFragment(TICKET));
+    EXPECT_FALSE(capture.records().empty());
+}
+
+// Runs in a fresh process whose module search is pointed at nothing when the library loads.
+void constructClientWithTicket() {
+    try {
+        HttpConfigurationClient client("127.0.0.1:9", true, false);
+    } catch (const std::exception& e) {
+        std::fprintf(stderr, "%s\n", e.what());
+        std::_Exit(3);
+    }
+    std::_Exit(0);
+}
+
+TEST(ServiceTicketDeathTest, AMissingModuleFailsClientsThatWantATicket) {
+    GTEST_FLAG_SET(death_test_style, "threadsafe");
+    setenv(ServiceTicketModule::LIBRARY_VARIABLE, "/nonexistent/libServerInterop.so", 1);
+    EXPECT_EXIT(constructClientWithTicket(), ::testing::ExitedWithCode(3),
+                "ServerInterop DLL is missing\\. Unable to get service ticket");
+    unsetenv(ServiceTicketModule::LIBRARY_VARIABLE);
+}
+
+}  // namespace
+}  // namespace Configuration

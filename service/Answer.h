@@ -1,0 +1,42 @@
+// Answer: the text of one answer of the configuration service. Answers are not XML documents to
+// be parsed but texts from which clients cut elements by their exact marks "<Tag>" and "</Tag>",
+// so every element is written as an opening tag without attributes, its escaped text and a
+// closing tag (never self-closing). Legacy answers carry "ReturnStatus" ("1" success, "0"
+// failure with "ErrorMessage"); error answers also carry the error record ("ErrorKey",
+// "ErrorCode", "ErrorMessage", ...) so that either kind of client reads them. A plain value.
+#pragma once
+
+#include <cstddef>
+#include <string>
+
+namespace ConfigurationService {
+
+class Answer {
+public:
+    // An answer whose root element is rootTag.
+    explicit Answer(const std::string& rootTag);
+
+    // Appends <tag>escaped text</tag>.
+    Answer& element(const std::string& tag, const std::string& text);
+    // Appends <tag>text</tag> for text known to need no escaping (Base64, digits).
+    Answer& trusted(const std::string& tag, const char* text, std::size_t length);
+    // Opens and closes a nesting element.
+    Answer& open(const std::string& tag);
+    Answer& close(const std::string& tag);
+    // Closes the root and returns the text.
+    std::string finish();
+
+    // A legacy success carrying what was appended, as <root><ReturnStatus>1</ReturnStatus>...
+    static Answer success(const std::string& operation);
+    // A failure readable by legacy clients and by clients that read the error record.
+    static std::string failure(const std::string& operation, const std::string& message,
+                               const std::string& errorKey = std::string());
+    // Escapes &, < and > for element text.
+    static std::string escape(const std::string& text);
+
+private:
+    std::string m_root;
+    std::string m_text;
+};
+
+}  // namespace ConfigurationService

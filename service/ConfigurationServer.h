@@ -1,0 +1,66 @@
+// ConfigurationServer: one configuration-service instance: its directory store, its road to the
+// master, its change event and the HTTP server (cpp-httplib, a pool of worker threads, keep-alive)
+// that answers POST /Sundrel/ConfigurationService/ConfigurationService.ashx. Bodies above the
+// configured limit are refused with HTTP 413. Owns everything it uses. run() blocks the calling
+// thread; stop() may be called from any thread (for example a signal-watching one).
+#pragma once
+
+#include <memory>
+#include <string>
+
+#include "ServiceOptions.h"
+
+namespace httplib {
+class Server;
+}
+
+namespace Configuration {
+class DirectoryStore;
+}
+
+namespace ConfigurationService {
+
+class ChangeNotifier;
+class MasterLink;
+class RequestDispatcher;
+class TicketCheck;
+struct ServiceContext;
+
+class ConfigurationServer {
+public:
+    static constexpr const char* kPath = "/Sundrel/ConfigurationService/ConfigurationService.ashx";
+
+    // Opens the store (locking its directory) and the change event and binds the listening
+    // socket; requests carrying serviceTicket are accepted. Throws std::runtime_error on failure.
+    ConfigurationServer(const ServiceOptions& options, const std::string& serviceTicket);
+    ~ConfigurationServer();
+    ConfigurationServer(const ConfigurationServer&) = delete;
+    ConfigurationServer& operator=(const ConfigurationServer&) = delete;
+
+    // The port it listens on.
+    int port() const { return m_port; }
+    // Serves requests until stop(); false when the server failed.
+    bool run();
+    // Stops serving; run() returns. Thread-safe.
+    void stop();
+    // Whether run() is serving.
+    bool running() const;
+    // The store (for tests and tools in the same process).
+    Configuration::DirectoryStore& store() { return *m_store; }
+
+private:
+    void configureHttp(const ServiceOptions& options);
+    void bindSocket(const ServiceOptions& options);
+
+    std::unique_ptr<Configuration::DirectoryStore> m_store;
+    std::unique_ptr<MasterLink> m_master;
+    std::unique_ptr<ChangeNotifier> m_changes;
+    std::unique_ptr<ServiceContext> m_context;
+    std::unique_ptr<TicketCheck> m_tickets;
+    std::unique_ptr<RequestDispatcher> m_dispatcher;
+    std::unique_ptr<httplib::Server> m_http;
+    int m_listenFd = -1;
+    int m_port = 0;
+};
+
+}  // namespace ConfigurationService

@@ -1,0 +1,158 @@
+// Store, retrieve, existence, times and listings of configuration documents.
+#include "ItemOperations.h"
+
+#include "Answer.h"
+#include "Quorvex/Base64Coder.h"
+#include "StoredDocuments.h"
+#include "TimeText.h"
+
+namespace ConfigurationService {
+namespace {
+
+using Configuration::DirectoryStore;
+using Configuration::StoredItem;
+
+std::string decodeBase64(const std::string& text) {
+    std::string compact;
+    const std::string* source = &text;
+    if (text.find_first_of(" \t\r\n") != std::string::npos) {
+        for (char c : text) {
+            if (c != ' ' && c != '\t' && c != '\r' && c != '\n') {
+                compact += c;
+            }
+        }
+        source = &compact;
+    }
+    try {
+        std::size_t length = 0;
+        const Quorvex::ByteArray bytes =
+            Base64Coder::Decode(source->data(), source->size(), length);
+        return std::string(reinterpret_cast<const char*>(bytes.get()), length);
+    } catch (const std::exception& e) {
+        throw OperationFailed(std::string("Configuration is not valid Base64: ") + e.what());
+    }
+}
+
+// The time a "Store" asks for, or kNow.
+std::int64_t requestedTime(const Request& request) {
+    const std::string text = request.optional("LastModifiedTime");
+    if (text.empty()) {
+        return DirectoryStore::kNow;
+    }
+    try {
+        return TimeText::parse(text);
+    } catch (const std::invalid_argument& e) {
+        throw OperationFailed(e.what());
+    }
+}
+
+StoredItem findItem(const DirectoryStore& store, const Request& request) {
+    const std::string& host = request.required("Host");
+    const std::string& name = request.required("ConfigurationName");
+    StoredItem item;
+    if (!store.retrieve(host.c_str(), name.c_str(), item)) {
+        throw OperationFailed::notFound(host, name);
+    }
+    return item;
+}
+
+Reply storedReply(const std::string& operation, std::int64_t time) {
+    return Reply{
+        200,
+        Answer::success(operation).element("LastModifiedTime", TimeText::format(time)).finish()};
+}
+
+}  // namespace
+
+void ItemOperations::registerInto(Operations& table) {
+    table.add("Store", [this](const Request& r) { return store(r); });
+    table.add("StoreMaster", [this](const Request& r) { return storeMaster(r); });
+    table.add("Retrieve", [this](const Request& r) { return retrieve(r); });
+    table.add(
+        "RetrieveItems", [this](const Request& r) { return retrieveItems(r); }, true, false);
+    table.add("Exists", [this](const Request& r) { return exists(r); });
+    table.add("GetLastModifiedTime", [this](const Request& r) { return lastModifiedTime(r); });
+    table.add("ListItems", [this](const Request& r) { return listItems(r); });
+}
+
+std::int64_t ItemOperations::storeHere(const Request& request, const std::string& bytes,
+                                       std::int64_t time) {
+    const std::string& host = request.required("Host");
+    const std::string& name = request.required("ConfigurationName");
+    try {
+        return m_context.store.store(ACE_CString(host.data(), host.size()),
+                                     ACE_CString(name.data(), name.size()), bytes.data(),
+                                     bytes.size(), time);
+    } catch (const std::invalid_argument& e) {
+        throw OperationFailed(e.what());
+    }
+}
+
+Reply ItemOperations::store(const Request& request) {
+    const std::string bytes = decodeBase64(request.required("Configuration"));
+    return storedReply("Store", storeHere(request, bytes, requestedTime(request)));
+}
+
+Reply ItemOperations::storeMaster(const Request& request) {
+    const std::string bytes = decodeBase64(request.required("Configuration"));
+    std::int64_t time = requestedTime(request);
+    if (!m_context.master.isMaster()) {
+        // The master gets the document first, so this copy never holds what the master lacks;
+        // both keep the same time.
+        if (time == DirectoryStore::kNow) {
+            time = TimeText::now();
+        }
+        try {
+            m_context.master.store(request.required("Host"), request.required("ConfigurationName"),
+                                   bytes, time);
+        } catch (const std::exception& e) {
+            throw OperationFailed(std::string("the master refused the document: ") + e.what(), 502);
+        }
+    }
+    return storedReply("StoreMaster", storeHere(request, bytes, time));
+}
+
+Reply ItemOperations::retrieve(const Request& request) {
+    const StoredItem item = findItem(m_context.store, request);
+    const ACE_CString base64 = Base64Coder::Encode(
+        reinterpret_cast<const unsigned char*>(item.bytes->data()), item.bytes->size());
+    Answer answer = Answer::success("Retrieve");
+    answer.element("LastModifiedTime", TimeText::format(item.lastModifiedMs));
+    answer.trusted("Configuration", base64.c_str(), base64.length());
+    return Reply{200, answer.finish()};
+}
+
+Reply ItemOperations::retrieveItems(const Request& request) {
+    const std::string& host = request.required("Host");
+    const std::string& names = request.required("ConfigurationName");
+    return Reply{200, StoredDocuments::collect(m_context.store, host, names, kNameSeparator)};
+}
+
+Reply ItemOperations::exists(const Request& request) {
+    const bool found = m_context.store.exists(request.required("Host").c_str(),
+                                              request.required("ConfigurationName").c_str());
+    return Reply{
+        200, Answer::success("Exists").element("ConfigurationExists", found ? "1" : "0").finish()};
+}
+
+Reply ItemOperations::lastModifiedTime(const Request& request) {
+    const StoredItem item = findItem(m_context.store, request);
+    return Reply{200, Answer::success("GetLastModifiedTime")
+                          .element("LastModifiedTime", TimeText::format(item.lastModifiedMs))
+                          .finish()};
+}
+
+Reply ItemOperations::listItems(const Request& request) {
+    const std::string& host = request.required("Host");
+    Answer answer = Answer::success("ListItems");
+    for (const StoredItem& item : m_context.store.list(host.c_str())) {
+        answer.open("ConfigurationItem");
+        answer.element("HostName", std::string(item.host.c_str(), item.host.length()));
+        answer.element("ConfigurationName", std::string(item.name.c_str(), item.name.length()));
+        answer.element("LastModifiedTime", TimeText::format(item.lastModifiedMs));
+        answer.close("ConfigurationItem");
+    }
+    return Reply{200, answer.finish()};
+}
+
+}  // namespace ConfigurationService

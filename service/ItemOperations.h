@@ -1,0 +1,38 @@
+// ItemOperations: the operations on stored documents: "Store", "StoreMaster", "Retrieve",
+// "RetrieveItems", "Exists", "GetLastModifiedTime" and "ListItems". Documents travel as Base64
+// text; "RetrieveItems" answers the element-tree XML of the requested documents. Holds only a
+// reference to the context; thread-safe.
+#pragma once
+
+#include <cstdint>
+#include <string>
+
+#include "Operations.h"
+#include "ServiceContext.h"
+
+namespace ConfigurationService {
+
+class ItemOperations {
+public:
+    // Separator of the names in a "RetrieveItems" request.
+    static constexpr char kNameSeparator = ';';
+
+    explicit ItemOperations(ServiceContext& context) : m_context(context) {}
+    // Adds the operations to the table.
+    void registerInto(Operations& table);
+
+private:
+    Reply store(const Request& request);
+    Reply storeMaster(const Request& request);
+    Reply retrieve(const Request& request);
+    Reply retrieveItems(const Request& request);
+    Reply exists(const Request& request);
+    Reply lastModifiedTime(const Request& request);
+    Reply listItems(const Request& request);
+
+    std::int64_t storeHere(const Request& request, const std::string& bytes, std::int64_t time);
+
+    ServiceContext& m_context;
+};
+
+}  // namespace ConfigurationService

@@ -1,0 +1,100 @@
+// configctl's command line.
+#include "ToolOptions.h"
+
+#include <cstdlib>
+#include <stdexcept>
+
+namespace Configctl {
+namespace {
+
+// The value of an option given as "--name value" or "--name=value".
+bool takeValue(const std::vector<std::string>& args, std::size_t& i, const std::string& name,
+               std::string& value) {
+    const std::string& arg = args[i];
+    if (arg == name) {
+        if (i + 1 >= args.size()) {
+            throw std::invalid_argument(name + " needs a value");
+        }
+        value = args[++i];
+        return true;
+    }
+    if (arg.compare(0, name.size() + 1, name + "=") == 0) {
+        value = arg.substr(name.size() + 1);
+        return true;
+    }
+    return false;
+}
+
+int parseModuleType(const std::string& text) {
+    char* end = nullptr;
+    const long value = std::strtol(text.c_str(), &end, 10);
+    if (text.empty() || *end != '\0' || value < 0 || value > 1000000) {
+        throw std::invalid_argument("--module-type needs a number, not \"" + text + "\"");
+    }
+    return static_cast<int>(value);
+}
+
+}  // namespace
+
+ToolOptions ToolOptions::parse(const std::vector<std::string>& args) {
+    ToolOptions options;
+    const char* fromEnvironment = std::getenv(kServerVariable);
+    options.server =
+        fromEnvironment != nullptr && *fromEnvironment ? fromEnvironment : kDefaultServer;
+    for (std::size_t i = 0; i < args.size(); ++i) {
+        std::string value;
+        const std::string& arg = args[i];
+        if (arg == "--help" || arg == "-h") {
+            options.help = true;
+        } else if (arg == "--https") {
+            options.https = true;
+        } else if (arg == "--master") {
+            options.viaMaster = true;
+        } else if (takeValue(args, i, "--server", value)) {
+            options.server = value;
+        } else if (takeValue(args, i, "--host", value)) {
+            options.host = value;
+        } else if (takeValue(args, i, "--module-type", value)) {
+            options.moduleType = parseModuleType(value);
+        } else if (arg.compare(0, 2, "--") == 0) {
+            throw std::invalid_argument("unknown option " + arg + " (see --help)");
+        } else if (options.command.empty()) {
+            options.command = arg;
+        } else {
+            options.arguments.push_back(arg);
+        }
+    }
+    if (options.command.empty() && !options.help) {
+        throw std::invalid_argument("no command given (see --help)");
+    }
+    return options;
+}
+
+std::string ToolOptions::usage() {
+    return "Usage: configctl [options] COMMAND [ARGUMENTS]\n"
+           "Administers a configuration service through the configuration library's client.\n\n"
+           "Commands:\n"
+           "  hosts                       list the hosts that registered services\n"
+           "  items                       list the documents of --host (\"*\": of every host)\n"
+           "  get NAME                    print a document as indented XML\n"
+           "  put NAME FILE               store the XML document in FILE\n"
+           "  exists NAME                 print \"yes\" or \"no\"\n"
+           "  time NAME                   print the document's last-modified time\n"
+           "  register SERVICE [CONNECTION]  register a service of --host\n"
+           "  unregister SERVICE          unregister a service of the service's own host\n"
+           "  changed | refresh | restart send that signal to the service\n"
+           "  info                        print the service's server information\n"
+           "  whoami                      print the service's host name and its master's\n\n"
+           "Options:\n"
+           "  --server HOST:PORT  the configuration service (default $QUORVEX_CONFIGURATION_SERVER"
+           " or 127.0.0.1:8771)\n"
+           "  --host NAME         the host the documents belong to (default: the service's own)\n"
+           "  --master            put: store through StoreMaster (reaches the master)\n"
+           "  --module-type N     hosts: only hosts that registered a module of type N\n"
+           "  --https             talk TLS\n"
+           "  --help              this text\n\n"
+           "The machine's service ticket is sent as cookie OrvelWebApplication. On failure the "
+           "exit status is 1 and one line on stderr says why.\n";
+}
+
+}  // namespace Configctl
