@@ -21,7 +21,8 @@ ASAN_OPTIONS=detect_leaks=1:abort_on_error=1 UBSAN_OPTIONS=print_stacktrace=1 \
   run_suite "$root/build-asan" -DQUORVEX_SANITIZE=ON -DQUORVEX_BENCH=OFF
 
 echo "=== ThreadSanitizer: concurrency tests"
-"$root/scripts/build.sh" "$root/build-tsan" -DQUORVEX_TSAN=ON -DQUORVEX_BENCH=OFF
+BUILD_TARGETS="platform_tests configuration_tests" \
+  "$root/scripts/build.sh" "$root/build-tsan" -DQUORVEX_TSAN=ON -DQUORVEX_BENCH=OFF
 (cd "$root/build-tsan" && TSAN_OPTIONS=halt_on_error=1 \
   ctest --output-on-failure -j"$(nproc)" --timeout 300 -R 'Concurrency|NamedEvent')
 echo "=== all test suites passed"

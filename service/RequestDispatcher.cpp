@@ -28,7 +28,7 @@ Reply failed(int status, const std::string& operation, const std::string& messag
 }  // namespace
 
 RequestDispatcher::RequestDispatcher(ServiceContext& context, const TicketCheck& tickets)
-    : m_context(context), m_tickets(tickets), m_items(context), m_site(context) {
+    : m_tickets(tickets), m_items(context), m_site(context) {
     m_items.registerInto(m_table);
     m_site.registerInto(m_table);
 }

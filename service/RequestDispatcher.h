@@ -30,7 +30,6 @@ public:
 private:
     Reply run(const Operations::Entry& entry, const Request& request) const;
 
-    ServiceContext& m_context;
     const TicketCheck& m_tickets;
     ItemOperations m_items;
     SiteOperations m_site;
