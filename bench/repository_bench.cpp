@@ -3,6 +3,7 @@
 //   - a cold read (GetLatest of a document not yet cached: timestamp + retrieve + decode + read);
 //   - a bare retrieve with the HTTP client alone (one request), for scale.
 // cold / bare shows what the repository adds on top of the transport.
+#include <ace/Log_Msg.h>
 #include <benchmark/benchmark.h>
 
 #include <memory>
@@ -49,13 +50,20 @@ private:
     }
 };
 
+ConfigurationService::ServiceOptions quietService() {
+    ConfigurationService::ServiceOptions options;
+    options.logLevel = "error";
+    return options;
+}
+
 struct World {
-    ServiceTesting::InProcessService service;
+    ServiceTesting::InProcessService service{quietService()};
     std::unique_ptr<HttpConfigurationClient> client;
     std::unique_ptr<ConfigurationRepository> repository;
     int nextCold = 0;
 
     World() {
+        ACE_Log_Msg::instance()->priority_mask(LM_ERROR | LM_CRITICAL, ACE_Log_Msg::PROCESS);
         client = std::make_unique<HttpConfigurationClient>(service.address().c_str(), true, false);
         const std::string bytes = StoredForm::encode(*SmallDoc().writeVesk());
         const auto* data = reinterpret_cast<const unsigned char*>(bytes.data());
