@@ -9,13 +9,11 @@
 #include <memory>
 #include <string>
 
-#include "Configuration/AnonParam.h"
 #include "Configuration/ConfigurationRepository.h"
 #include "Configuration/HttpConfigurationClient.h"
 #include "Configuration/StoredForm.h"
-#include "Configuration/TypedConfigDoc.h"
 #include "InProcessService.h"
-#include "model/Fields.h"
+#include "model/TestDocument.h"
 #include "repository/HttpServiceConnection.h"
 
 namespace {
@@ -24,31 +22,7 @@ using namespace Configuration;
 
 constexpr int kColdDocuments = 3000;
 
-class SmallDoc : public TypedConfigDoc<SmallDoc> {
-public:
-    explicit SmallDoc(const std::string& name = "Small")
-        : TypedConfigDoc(ConfigDoc::getConfigurationRegistryPath() + name.c_str(), false) {}
-    bool readVesk(const Vesk::Element& e) override {
-        return Fields::read(*this, e, "Small", Fields::FailureForm::Failed);
-    }
-    Quorvex::auto_ptr<Vesk::Element> writeVesk() const override {
-        return Fields::write(*this, "Small");
-    }
-    ACE_CString host = "storage-node-01";
-    unsigned int port = 104;
-    bool enabled = true;
-    AnonParam param;
-
-private:
-    friend struct Fields::Access;
-    template <class Self, class Io>
-    static void fields(Self& s, Io& io) {
-        io("Host", s.host);
-        io("Port", s.port);
-        io("Enabled", s.enabled);
-        io("AnonParam", s.param);
-    }
-};
+using SmallDoc = Testing::TestDocument;
 
 ConfigurationService::ServiceOptions quietService() {
     ConfigurationService::ServiceOptions options;
@@ -67,7 +41,7 @@ struct World {
         client = std::make_unique<HttpConfigurationClient>(service.address().c_str(), true, false);
         const std::string bytes = StoredForm::encode(*SmallDoc().writeVesk());
         const auto* data = reinterpret_cast<const unsigned char*>(bytes.data());
-        client->store("TestHost", "BrimmetServer\\Small", data, bytes.size(), "");
+        client->store("TestHost", "BrimmetServer\\TestDoc", data, bytes.size(), "");
         for (int i = 0; i < kColdDocuments; ++i) {
             const std::string name = "BrimmetServer\\Cold" + std::to_string(i);
             client->store("TestHost", name.c_str(), data, bytes.size(), "");
@@ -101,7 +75,8 @@ void BM_CachedGetLatest(benchmark::State& state) {
 void BM_ColdGetLatest(benchmark::State& state) {
     World& w = world();
     for (auto _ : state) {
-        SmallDoc doc("Cold" + std::to_string(w.nextCold++ % kColdDocuments));
+        const std::string name = "Cold" + std::to_string(w.nextCold++ % kColdDocuments);
+        SmallDoc doc(name.c_str());
         if (w.repository->GetLatest(doc) != 0) {
             state.SkipWithError("GetLatest failed");
             break;
@@ -114,7 +89,7 @@ void BM_BareClientRetrieve(benchmark::State& state) {
     for (auto _ : state) {
         Quorvex::ByteArray bytes;
         std::size_t length = 0;
-        w.client->retrieve("TestHost", "BrimmetServer\\Small", bytes, length);
+        w.client->retrieve("TestHost", "BrimmetServer\\TestDoc", bytes, length);
         benchmark::DoNotOptimize(length);
     }
 }

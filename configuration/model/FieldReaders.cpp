@@ -25,10 +25,11 @@ Lookup lookup(const Vesk::MultiElementValue& children, const char* key, const AC
     return Lookup::Text;
 }
 
-// Extracts a number or flag with the stream's own operator (no boolalpha); a text that does not
-// parse leaves the field unchanged.
-template <class T>
-bool readStreamed(const Vesk::MultiElementValue& children, const char* key, T& field) {
+// Reads the child of key into field: no child keeps the field (false); a child without a value
+// resets it to its empty value; a text goes through convert(text, field).
+template <class T, class Convert>
+bool readText(const Vesk::MultiElementValue& children, const char* key, T& field,
+              Convert convert) {
     const ACE_CString* text = nullptr;
     switch (lookup(children, key, text)) {
         case Lookup::Missing:
@@ -37,48 +38,37 @@ bool readStreamed(const Vesk::MultiElementValue& children, const char* key, T& f
             field = T();
             return true;
         case Lookup::Text:
-            break;
+            convert(*text, field);
+            return true;
     }
-    std::istringstream in(std::string(text->c_str(), text->length()));
-    T parsed{};
-    if (in >> parsed) {
-        field = parsed;
-    }
-    return true;
+    return false;
+}
+
+// Extracts a number or flag with the stream's own operator (no boolalpha); a text that does not
+// parse leaves the field unchanged.
+template <class T>
+bool readStreamed(const Vesk::MultiElementValue& children, const char* key, T& field) {
+    return readText(children, key, field, [](const ACE_CString& text, T& out) {
+        std::istringstream in(std::string(text.c_str(), text.length()));
+        T parsed{};
+        if (in >> parsed) {
+            out = parsed;
+        }
+    });
 }
 
 // Builds a date or time from the text.
 template <class T>
 bool readConstructed(const Vesk::MultiElementValue& children, const char* key, T& field) {
-    const ACE_CString* text = nullptr;
-    switch (lookup(children, key, text)) {
-        case Lookup::Missing:
-            return false;
-        case Lookup::NoValue:
-            field = T();
-            return true;
-        case Lookup::Text:
-            field = T(*text);
-            return true;
-    }
-    return false;
+    return readText(children, key, field,
+                    [](const ACE_CString& text, T& out) { out = T(text); });
 }
 
 }  // namespace
 
 bool readField(const Vesk::MultiElementValue& children, const char* key, ACE_CString& field) {
-    const ACE_CString* text = nullptr;
-    switch (lookup(children, key, text)) {
-        case Lookup::Missing:
-            return false;
-        case Lookup::NoValue:
-            field.clear();
-            return true;
-        case Lookup::Text:
-            field = *text;
-            return true;
-    }
-    return false;
+    return readText(children, key, field,
+                    [](const ACE_CString& text, ACE_CString& out) { out = text; });
 }
 
 bool readField(const Vesk::MultiElementValue& children, const char* key, bool& field) {
