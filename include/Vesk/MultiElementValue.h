@@ -29,6 +29,8 @@ public:
 
     MultiElementValue();
     MultiElementValue(const MultiElementValue& other);
+    // Takes other's children (other is left empty); references to them stay valid.
+    MultiElementValue(MultiElementValue&& other) noexcept;
     MultiElementValue& operator=(const MultiElementValue& other);
     ~MultiElementValue() override;
 

@@ -14,10 +14,13 @@ class MultiElementValue;
 
 class MultiValue : public Value {
 public:
-    using const_iterator = PointerIterator<std::vector<std::unique_ptr<Value>>::const_iterator, const Value>;
+    using const_iterator =
+        PointerIterator<std::vector<std::unique_ptr<Value>>::const_iterator, const Value>;
 
     MultiValue();
     MultiValue(const MultiValue& other);
+    // Takes other's values (other is left empty).
+    MultiValue(MultiValue&& other) noexcept;
     MultiValue& operator=(const MultiValue& other);
     ~MultiValue() override;
 

@@ -1,7 +1,10 @@
 #include "Vesk/Element.h"
 
+#include <new>
 #include <string>
 #include <utility>
+
+#include "NodePool.h"
 
 namespace Vesk {
 
@@ -41,11 +44,12 @@ V& valueAs(const ACE_CString& key, Value* value, Value::Kind kind, const char* c
 
 Element::Element(const ACE_CString& key, int id) : m_key(key), m_id(id) {}
 
+Element::Element(const char* key, std::size_t len, int id) : m_key(key, len), m_id(id) {}
+
 Element::Element(const Element& other)
-    : m_key(other.m_key),
-      m_id(other.m_id),
-      m_attributes(other.m_attributes),
-      m_value(other.m_value ? other.m_value->clone() : nullptr) {}
+    : m_key(other.m_key), m_id(other.m_id), m_attributes(other.m_attributes) {
+    copyValue(other);
+}
 
 Element& Element::operator=(const Element& other) {
     if (this != &other) {
@@ -56,82 +60,149 @@ Element& Element::operator=(const Element& other) {
 }
 
 Element::Element(Element&& other) noexcept
-    : m_id(other.m_id),
-      m_attributes(std::move(other.m_attributes)),
-      m_value(std::move(other.m_value)) {
-    m_key.swap(other.m_key);
+    : m_key(std::move(other.m_key)), m_id(other.m_id), m_attributes(std::move(other.m_attributes)) {
+    takeValue(other);
 }
 
 Element& Element::operator=(Element&& other) noexcept {
     if (this != &other) {
-        m_key.swap(other.m_key);
-        other.m_key.clear();
-        m_id = other.m_id;
-        m_attributes = std::move(other.m_attributes);
-        other.m_attributes.clear();
-        m_value = std::move(other.m_value);
+        // Taken out first: other may lie inside this element's value, which goes next.
+        Element taken(std::move(other));
+        m_key = std::move(taken.m_key);
+        m_id = taken.m_id;
+        m_attributes = std::move(taken.m_attributes);
+        dropValue();
+        takeValue(taken);
     }
     return *this;
 }
 
-Element::~Element() = default;
+Element::~Element() {
+    dropValue();
+}
+
+void* Element::operator new(std::size_t size) {
+    return NodePool::allocate(size);
+}
+
+void Element::operator delete(void* block, std::size_t size) noexcept {
+    NodePool::deallocate(block, size);
+}
+
+void Element::dropValue() noexcept {
+    if (m_value == nullptr) {
+        return;
+    }
+    if (m_valueInline) {
+        m_value->~Value();
+    } else {
+        delete m_value;
+    }
+    m_value = nullptr;
+    m_valueInline = false;
+}
+
+template <class V, class... Args>
+V& Element::emplaceValue(Args&&... args) {
+    dropValue();
+    V* value = ::new (static_cast<void*>(&m_inline)) V(std::forward<Args>(args)...);
+    m_value = value;
+    m_valueInline = true;
+    return *value;
+}
+
+void Element::copyValue(const Element& other) {
+    if (other.m_value == nullptr) {
+        return;
+    }
+    if (!other.m_valueInline) {
+        m_value = other.m_value->clone().release();
+        return;
+    }
+    switch (other.m_value->kind()) {
+        case Value::Kind::Single:
+            emplaceValue<SingleValue>(static_cast<const SingleValue&>(*other.m_value));
+            break;
+        case Value::Kind::Multi:
+            emplaceValue<MultiValue>(static_cast<const MultiValue&>(*other.m_value));
+            break;
+        case Value::Kind::MultiElement:
+            emplaceValue<MultiElementValue>(static_cast<const MultiElementValue&>(*other.m_value));
+            break;
+    }
+}
+
+void Element::takeValue(Element& other) noexcept {
+    if (other.m_value == nullptr) {
+        return;
+    }
+    if (!other.m_valueInline) {
+        m_value = other.m_value;
+        other.m_value = nullptr;
+        return;
+    }
+    switch (other.m_value->kind()) {
+        case Value::Kind::Single:
+            emplaceValue<SingleValue>(std::move(static_cast<SingleValue&>(*other.m_value)));
+            break;
+        case Value::Kind::Multi:
+            emplaceValue<MultiValue>(std::move(static_cast<MultiValue&>(*other.m_value)));
+            break;
+        case Value::Kind::MultiElement:
+            emplaceValue<MultiElementValue>(
+                std::move(static_cast<MultiElementValue&>(*other.m_value)));
+            break;
+    }
+    other.dropValue();
+}
 
 SingleValue& Element::addSingle() {
-    auto value = std::make_unique<SingleValue>();
-    SingleValue& result = *value;
-    m_value = std::move(value);
-    return result;
+    return emplaceValue<SingleValue>();
 }
 
 MultiValue& Element::addMulti() {
-    auto value = std::make_unique<MultiValue>();
-    MultiValue& result = *value;
-    m_value = std::move(value);
-    return result;
+    return emplaceValue<MultiValue>();
 }
 
 MultiElementValue& Element::addMultiElement() {
-    auto value = std::make_unique<MultiElementValue>();
-    MultiElementValue& result = *value;
-    m_value = std::move(value);
-    return result;
+    return emplaceValue<MultiElementValue>();
 }
 
 void Element::setValue(std::unique_ptr<Value> value) {
-    m_value = std::move(value);
+    dropValue();
+    m_value = value.release();
 }
 
 const Value& Element::value() const {
-    if (!m_value) {
-        throw NoValueSetEx("Vesk::Element::value: element " + quoted(m_key) + " has no value");
+    if (m_value == nullptr) {
+        throw NoValueSetEx("Vesk::Element::value: element " + quoted(key()) + " has no value");
     }
     return *m_value;
 }
 
 const SingleValue& Element::getSingle() const {
-    return valueAs<const SingleValue>(m_key, m_value.get(), Value::Kind::Single, "getSingle");
+    return valueAs<const SingleValue>(key(), m_value, Value::Kind::Single, "getSingle");
 }
 
 SingleValue& Element::getSingle() {
-    return valueAs<SingleValue>(m_key, m_value.get(), Value::Kind::Single, "getSingle");
+    return valueAs<SingleValue>(key(), m_value, Value::Kind::Single, "getSingle");
 }
 
 const MultiValue& Element::getMulti() const {
-    return valueAs<const MultiValue>(m_key, m_value.get(), Value::Kind::Multi, "getMulti");
+    return valueAs<const MultiValue>(key(), m_value, Value::Kind::Multi, "getMulti");
 }
 
 MultiValue& Element::getMulti() {
-    return valueAs<MultiValue>(m_key, m_value.get(), Value::Kind::Multi, "getMulti");
+    return valueAs<MultiValue>(key(), m_value, Value::Kind::Multi, "getMulti");
 }
 
 const MultiElementValue& Element::getMultiElement() const {
-    return valueAs<const MultiElementValue>(m_key, m_value.get(), Value::Kind::MultiElement,
+    return valueAs<const MultiElementValue>(key(), m_value, Value::Kind::MultiElement,
                                             "getMultiElement");
 }
 
 MultiElementValue& Element::getMultiElement() {
-    return valueAs<MultiElementValue>(m_key, m_value.get(), Value::Kind::MultiElement,
-                                      "getMultiElement");
+    return valueAs<MultiElementValue>(key(), m_value, Value::Kind::MultiElement, "getMultiElement");
 }
 
 ACE_CString Element::getAttributeValue(const ACE_CString& name, bool& found) const {

@@ -134,6 +134,52 @@ TEST(VeskElement, MovesTakeTheTreeAndLeaveAnEmptyElement) {
     EXPECT_TRUE(moved.attributes().empty());
 }
 
+TEST(VeskElement, ChildrenAndGivenValuesStayWhereTheyAreWhenTheElementMoves) {
+    Element list("List");
+    MultiElementValue& children = list.addMultiElement();
+    Element& first = children.addElement(withText("First", "1"));
+    for (int i = 0; i < 100; ++i) {
+        children.addElement(withText("Sibling", "s"));  // the children's vector grows meanwhile
+    }
+    Element movedList(std::move(list));
+    EXPECT_EQ(&first, &movedList.getMultiElement().getElement("First"));
+    EXPECT_EQ("1", textOf(first));
+
+    auto given = std::make_unique<SingleValue>(ACE_CString("given"));
+    const SingleValue* address = given.get();
+    Element holder("Holder");
+    holder.setValue(std::move(given));
+    Element movedHolder(std::move(holder));
+    EXPECT_EQ(address, &movedHolder.getSingle());
+    const Element copy(movedHolder);
+    EXPECT_NE(address, &copy.getSingle());
+    EXPECT_EQ(movedHolder, copy);
+}
+
+// Guards against reading the source after freeing it: it may sit inside the target's value.
+TEST(VeskElement, AssigningAnElementFromItsOwnDescendant) {
+    Element root = sampleTree();
+    root = std::move(root.getMultiElement().getElement("List"));
+    EXPECT_EQ("List", std::string(root.key().c_str()));
+    EXPECT_EQ(3u, root.getMulti().size());
+
+    Element other = sampleTree();
+    other = other.getMultiElement().getElement("Tag");
+    EXPECT_EQ(withText("Tag", "a"), other);
+}
+
+TEST(VeskElement, LongKeysAndTextsSurviveCopiesAndMoves) {
+    const std::string longKey(100, 'k');
+    const std::string longText(1000, 't');
+    Element element(longKey.c_str(), longKey.size(), -1);
+    element.addSingle().assign(longText.c_str());
+    Element copy(element);
+    Element moved(std::move(element));
+    EXPECT_EQ(copy, moved);
+    EXPECT_EQ(longKey, moved.key().c_str());
+    EXPECT_EQ(longText, textOf(moved));
+}
+
 TEST(VeskElement, EqualityComparesKeyAttributesAndValuesDeeply) {
     const Element base = sampleTree();
     Element differentKey = sampleTree();

@@ -51,13 +51,13 @@ void decode(const unsigned char* s, std::size_t len, std::string& out) {
 
 }  // namespace
 
-ACE_CString Latin1::view(const char* utf8, std::string& scratch) {
+std::string_view Latin1::view(const char* utf8, std::string& scratch) {
     const std::size_t len = std::strlen(utf8);
     if (isAscii(utf8, len)) {
-        return ACE_CString(utf8, len, nullptr, false);
+        return std::string_view(utf8, len);
     }
     decode(reinterpret_cast<const unsigned char*>(utf8), len, scratch);
-    return ACE_CString(scratch.data(), scratch.size(), nullptr, false);
+    return scratch;
 }
 
 }  // namespace Vesk

@@ -2,9 +2,8 @@
 // strings of the element tree. Stateless and thread-safe.
 #pragma once
 
-#include <ace/SString.h>
-
 #include <string>
+#include <string_view>
 
 namespace Vesk {
 
@@ -14,7 +13,7 @@ public:
     // into utf8 itself when that is plain ASCII (the common case, no copy), else into scratch.
     // Valid while both live and scratch is not reused. TrelException for broken UTF-8 or a
     // character above U+00FF.
-    static ACE_CString view(const char* utf8, std::string& scratch);
+    static std::string_view view(const char* utf8, std::string& scratch);
 };
 
 }  // namespace Vesk

@@ -17,6 +17,9 @@ MultiElementValue::MultiElementValue(const MultiElementValue& other) : Value(oth
     }
 }
 
+MultiElementValue::MultiElementValue(MultiElementValue&& other) noexcept
+    : Value(other), m_children(std::move(other.m_children)) {}
+
 MultiElementValue& MultiElementValue::operator=(const MultiElementValue& other) {
     if (this != &other) {
         MultiElementValue copy(other);

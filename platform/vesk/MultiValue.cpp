@@ -17,6 +17,9 @@ MultiValue::MultiValue(const MultiValue& other) : Value(other) {
     }
 }
 
+MultiValue::MultiValue(MultiValue&& other) noexcept
+    : Value(other), m_values(std::move(other.m_values)) {}
+
 MultiValue& MultiValue::operator=(const MultiValue& other) {
     if (this != &other) {
         MultiValue copy(other);

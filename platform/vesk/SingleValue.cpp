@@ -7,7 +7,8 @@ std::unique_ptr<Value> SingleValue::clone() const {
 }
 
 bool SingleValue::equals(const Value& other) const {
-    return other.kind() == Kind::Single && m_text == static_cast<const SingleValue&>(other).m_text;
+    return other.kind() == Kind::Single &&
+           value() == static_cast<const SingleValue&>(other).value();
 }
 
 }  // namespace Vesk

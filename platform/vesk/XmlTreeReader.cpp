@@ -103,17 +103,23 @@ Element XmlTreeReader::read(const pugi::xml_document& doc) {
         refuse("the root element must be <e>, not " + shown(root.name()));
     }
     XmlTreeReader reader;
-    return std::move(*reader.readElement(root, 1));
+    const std::string_view key = reader.readKey(root, 1);
+    Element tree(key.data(), key.size(), -1);
+    reader.readContent(root, 1, tree);
+    return tree;
 }
 
-std::unique_ptr<Element> XmlTreeReader::readElement(pugi::xml_node node, int depth) {
+std::string_view XmlTreeReader::readKey(pugi::xml_node node, int depth) {
     checkDepth(depth);
     const pugi::xml_attribute key = node.first_attribute();
     bool base64 = false;
     if (!key || key.next_attribute() || !isText(key, "k", base64)) {
         refuse("<e> takes exactly one attribute, k or k64");
     }
-    auto element = std::make_unique<Element>(decodeText(key.value(), base64), -1);
+    return decodeText(key.value(), base64);
+}
+
+void XmlTreeReader::readContent(pugi::xml_node node, int depth, Element& element) {
     requireBlank(node.value(), "inside <e>");
     Attributes attributes;
     for (pugi::xml_node child = node.first_child(); child; child = child.next_sibling()) {
@@ -125,20 +131,19 @@ std::unique_ptr<Element> XmlTreeReader::readElement(pugi::xml_node node, int dep
         if (tag == Tag::Element || tag == Tag::Unknown) {
             refuse("unexpected " + shown(child.name()) + " inside <e>");
         }
-        if (element->hasValue()) {
+        if (element.hasValue()) {
             refuse(tag == Tag::Attribute ? "<a> after the value of <e>"
                                          : "more than one value inside <e>");
         }
         if (tag == Tag::Attribute) {
             readAttribute(child, attributes);
         } else {
-            element->setValue(readValue(child, tag, depth + 1));
+            addValue(child, tag, depth + 1, element);
         }
     }
     if (!attributes.empty()) {
-        element->insertAttributes(attributes);
+        element.insertAttributes(attributes);
     }
-    return element;
 }
 
 void XmlTreeReader::readAttribute(pugi::xml_node node, Attributes& attributes) {
@@ -153,32 +158,39 @@ void XmlTreeReader::readAttribute(pugi::xml_node node, Attributes& attributes) {
     if (node.first_child() || node.value()[0] != '\0') {
         refuse("<a> must be empty");
     }
-    // Assignment copies each view before the next decodeText reuses its buffer.
+    // Each view is copied before the next decodeText reuses its buffer.
     attributes.emplace_back();
-    attributes.back().first = decodeText(name.value(), nameBase64);
-    attributes.back().second = decodeText(value.value(), valueBase64);
+    const std::string_view first = decodeText(name.value(), nameBase64);
+    attributes.back().first.set(first.data(), first.size(), true);
+    const std::string_view second = decodeText(value.value(), valueBase64);
+    attributes.back().second.set(second.data(), second.size(), true);
 }
 
-std::unique_ptr<Value> XmlTreeReader::readValue(pugi::xml_node node, Tag tag, int depth) {
+template <class Target>
+void XmlTreeReader::addValue(pugi::xml_node node, Tag tag, int depth, Target& target) {
     switch (tag) {
         case Tag::Single:
-        case Tag::Single64:
-            return std::make_unique<SingleValue>(nodeText(node, tag == Tag::Single64));
+        case Tag::Single64: {
+            const std::string_view text = nodeText(node, tag == Tag::Single64);
+            target.addSingle().assign(text.data(), text.size());
+            return;
+        }
         case Tag::Multi:
-            return readMulti(node, depth);
+            readMulti(node, depth, target.addMulti());
+            return;
         case Tag::List:
-            return readList(node, depth);
+            readList(node, depth, target.addMultiElement());
+            return;
         default:
             refuse("expected a value, found " + shown(node.name()));
     }
 }
 
-std::unique_ptr<Value> XmlTreeReader::readMulti(pugi::xml_node node, int depth) {
+void XmlTreeReader::readMulti(pugi::xml_node node, int depth, MultiValue& multi) {
     checkDepth(depth);
     requireNoAttributes(node);
     requireBlank(node.value(), "inside <m>");
-    auto multi = std::make_unique<MultiValue>();
-    multi->reserve(countElements(node));
+    multi.reserve(countElements(node));
     for (pugi::xml_node child = node.first_child(); child; child = child.next_sibling()) {
         if (child.type() != pugi::node_element) {
             requireBlankNode(child, "inside <m>");
@@ -188,17 +200,17 @@ std::unique_ptr<Value> XmlTreeReader::readMulti(pugi::xml_node node, int depth) 
         if (tag == Tag::Element || tag == Tag::Attribute || tag == Tag::Unknown) {
             refuse("unexpected " + shown(child.name()) + " inside <m>");
         }
-        multi->addValue(readValue(child, tag, depth + 1));
+        addValue(child, tag, depth + 1, multi);
     }
-    return multi;
 }
 
-std::unique_ptr<Value> XmlTreeReader::readList(pugi::xml_node node, int depth) {
+void XmlTreeReader::readList(pugi::xml_node node, int depth, MultiElementValue& list) {
     checkDepth(depth);
     requireNoAttributes(node);
     requireBlank(node.value(), "inside <l>");
-    auto list = std::make_unique<MultiElementValue>();
-    list->reserve(countElements(node));
+    // The children wait on m_pending (shared by all levels) until their count is known, so that
+    // the list is allocated once at its exact size without walking the nodes twice.
+    const std::size_t first = m_pending.size();
     for (pugi::xml_node child = node.first_child(); child; child = child.next_sibling()) {
         if (child.type() != pugi::node_element) {
             requireBlankNode(child, "inside <l>");
@@ -207,12 +219,20 @@ std::unique_ptr<Value> XmlTreeReader::readList(pugi::xml_node node, int depth) {
         if (XmlFormat::classify(child.name()) != Tag::Element) {
             refuse("unexpected " + shown(child.name()) + " inside <l>");
         }
-        list->addElement(readElement(child, depth + 1).release());
+        const std::string_view key = readKey(child, depth + 1);
+        std::unique_ptr<Element> element(new Element(key.data(), key.size(), -1));
+        Element& filled = *element;
+        m_pending.push_back(std::move(element));
+        readContent(child, depth + 1, filled);
     }
-    return list;
+    list.reserve(m_pending.size() - first);
+    for (std::size_t i = first; i < m_pending.size(); ++i) {
+        list.addElement(m_pending[i].release());
+    }
+    m_pending.resize(first);
 }
 
-ACE_CString XmlTreeReader::nodeText(pugi::xml_node node, bool base64) {
+std::string_view XmlTreeReader::nodeText(pugi::xml_node node, bool base64) {
     requireNoAttributes(node);
     pugi::xml_node child = node.first_child();
     if (!child) {
@@ -229,22 +249,18 @@ ACE_CString XmlTreeReader::nodeText(pugi::xml_node node, bool base64) {
     return decodeText(m_joined.c_str(), base64);
 }
 
-ACE_CString XmlTreeReader::decodeText(const char* utf8, bool base64) {
+std::string_view XmlTreeReader::decodeText(const char* utf8, bool base64) {
     if (!base64) {
         return Latin1::view(utf8, m_latin1);
     }
     std::size_t len = 0;
-    Quorvex::ByteArray bytes;
     try {
-        bytes = Base64Coder::Decode(utf8, std::strlen(utf8), len);
+        m_decoded = Base64Coder::Decode(utf8, std::strlen(utf8), len);
     } catch (const std::invalid_argument&) {
         refuse("a string marked as Base64 is not valid Base64");
     }
-    m_decoded.clear();
-    if (len != 0) {
-        m_decoded.assign(reinterpret_cast<const char*>(bytes.get()), len);
-    }
-    return ACE_CString(m_decoded.data(), m_decoded.size(), nullptr, false);
+    return len == 0 ? std::string_view()
+                    : std::string_view(reinterpret_cast<const char*>(m_decoded.get()), len);
 }
 
 }  // namespace Vesk

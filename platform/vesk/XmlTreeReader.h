@@ -9,7 +9,10 @@
 
 #include <memory>
 #include <string>
+#include <string_view>
+#include <vector>
 
+#include "Quorvex/auto_ptr.h"
 #include "Vesk/Element.h"
 #include "XmlFormat.h"
 
@@ -22,21 +25,27 @@ public:
     static Element read(const pugi::xml_document& doc);
 
 private:
-    std::unique_ptr<Element> readElement(pugi::xml_node node, int depth);
+    // The key of an e node, after checking its nesting depth and attributes; a view valid until
+    // the next call.
+    std::string_view readKey(pugi::xml_node node, int depth);
+    // Fills element from the children of its e node: attributes and value.
+    void readContent(pugi::xml_node node, int depth, Element& element);
     void readAttribute(pugi::xml_node node, Attributes& attributes);
-    std::unique_ptr<Value> readValue(pugi::xml_node node, XmlFormat::Tag tag, int depth);
-    std::unique_ptr<Value> readMulti(pugi::xml_node node, int depth);
-    std::unique_ptr<Value> readList(pugi::xml_node node, int depth);
+    // Gives target (an Element or a MultiValue) the value that node (of that tag) holds.
+    template <class Target>
+    void addValue(pugi::xml_node node, XmlFormat::Tag tag, int depth, Target& target);
+    void readMulti(pugi::xml_node node, int depth, MultiValue& multi);
+    void readList(pugi::xml_node node, int depth, MultiElementValue& list);
     // The text of an s or s64 node, as a view valid until the next call.
-    ACE_CString nodeText(pugi::xml_node node, bool base64);
+    std::string_view nodeText(pugi::xml_node node, bool base64);
     // A string of the document as a view valid until the next call: utf8 converted to 8-bit
-    // bytes, or decoded from Base64. Copy it (by assignment or a const-reference parameter)
-    // before the next call; initialising a variable from the result does not copy.
-    ACE_CString decodeText(const char* utf8, bool base64);
+    // bytes, or decoded from Base64.
+    std::string_view decodeText(const char* utf8, bool base64);
 
-    std::string m_latin1;   // 8-bit bytes of a string that was not plain ASCII
-    std::string m_joined;   // a text that pugixml handed out in several pieces
-    std::string m_decoded;  // bytes decoded from Base64
+    std::string m_latin1;          // 8-bit bytes of a string that was not plain ASCII
+    std::string m_joined;          // a text that pugixml handed out in several pieces
+    Quorvex::ByteArray m_decoded;  // bytes decoded from Base64
+    std::vector<std::unique_ptr<Element>> m_pending;  // children read, not yet in their list
 };
 
 }  // namespace Vesk
