@@ -5,6 +5,7 @@
 
 #include <filesystem>
 #include <map>
+#include <tuple>
 
 #include "InProcessService.h"
 #include "RawPost.h"
@@ -26,12 +27,17 @@ std::map<std::string, std::uintmax_t> snapshot(const std::string& directory) {
     return files;
 }
 
+// A Store request: host, name and the elements that follow them.
+std::string storeBody(const std::string& host, const std::string& name,
+                      const std::string& rest = "<Configuration>AA==</Configuration>") {
+    return "<Store><Host>" + host + "</Host><ConfigurationName>" + name + "</ConfigurationName>" +
+           rest + "</Store>";
+}
+
 class BadInput : public ::testing::Test {
 protected:
     BadInput() : service(options()) {
-        post(
-            "<Store><Host>h</Host><ConfigurationName>kept</ConfigurationName>"
-            "<Configuration>a2VwdA==</Configuration></Store>");
+        post(storeBody("h", "kept", "<Configuration>a2VwdA==</Configuration>"));
         before = snapshot(service.storeDirectory());
     }
 
@@ -73,50 +79,39 @@ TEST_F(BadInput, UnknownRootElementIsRefused) {
 }
 
 TEST_F(BadInput, IncompleteOrInvalidParametersAreRefused) {
-    expectRefused(post("<Store><Host>h</Host><ConfigurationName>n</ConfigurationName></Store>"),
-                  200, "needs the element Configuration");
-    expectRefused(post("<Store><Host>h</Host><ConfigurationName>n</ConfigurationName>"
-                       "<Configuration>!!not base64!!</Configuration></Store>"),
-                  200, "not valid Base64");
-    expectRefused(post("<Store><Host>h</Host><ConfigurationName>n</ConfigurationName>"
-                       "<Configuration>AA==</Configuration><LastModifiedTime>yesterday"
-                       "</LastModifiedTime></Store>"),
-                  200, "not a date and time");
-    expectRefused(post("<Store><Host><x>h</x></Host><ConfigurationName>n</ConfigurationName>"
-                       "<Configuration>AA==</Configuration></Store>"),
-                  400, "hold only text");
-    expectRefused(post("<Store><Host>h</Host><ConfigurationName></ConfigurationName>"
-                       "<Configuration>AA==</Configuration></Store>"),
-                  200, "configuration name is empty");
-    expectRefused(post("<Store><Host>*</Host><ConfigurationName>n</ConfigurationName>"
-                       "<Configuration>AA==</Configuration></Store>"),
-                  200, "not a host name");
+    const std::tuple<std::string, int, const char*> cases[] = {
+        {storeBody("h", "n", ""), 200, "needs the element Configuration"},
+        {storeBody("h", "n", "<Configuration>!!not base64!!</Configuration>"), 200,
+         "not valid Base64"},
+        {storeBody("h", "n",
+                   "<Configuration>AA==</Configuration><LastModifiedTime>yesterday"
+                   "</LastModifiedTime>"),
+         200, "not a date and time"},
+        {storeBody("<x>h</x>", "n"), 400, "hold only text"},
+        {storeBody("h", ""), 200, "configuration name is empty"},
+        {storeBody("*", "n"), 200, "not a host name"}};
+    for (const auto& c : cases) {
+        expectRefused(post(std::get<0>(c)), std::get<1>(c), std::get<2>(c));
+    }
 }
 
 TEST_F(BadInput, EntitiesAreNeverExpanded) {
-    expectRefused(post("<!DOCTYPE Store [<!ENTITY e SYSTEM \"file:///etc/passwd\">]>"
-                       "<Store><Host>&e;</Host><ConfigurationName>n</ConfigurationName></Store>"),
+    expectRefused(post("<!DOCTYPE Store [<!ENTITY e SYSTEM \"file:///etc/passwd\">]>" +
+                       storeBody("&e;", "n", "")),
                   200, "needs the element Configuration");
 }
 
 TEST_F(BadInput, OversizedBodyIsRefusedWith413) {
-    const std::string body =
-        "<Store><Host>h</Host><ConfigurationName>n</ConfigurationName>"
-        "<Configuration>" +
-        std::string(8192, 'A') + "</Configuration></Store>";
-    expectRefused(post(body), 413, "larger than this service accepts");
+    expectRefused(post(storeBody("h", "n", std::string(8192, 'A'))), 413,
+                  "larger than this service accepts");
 }
 
 TEST_F(BadInput, MissingOrWrongTicketIsRefused) {
-    const std::string body =
-        "<Store><Host>h</Host><ConfigurationName>n</ConfigurationName>"
-        "<Configuration>AA==</Configuration></Store>";
-    expectRefused(ServiceTesting::rawPost(service.port(), body, ""), 403, "service ticket");
-    expectRefused(ServiceTesting::rawPost(service.port(), body, "OrvelWebApplication=guess"), 403,
-                  "service ticket");
-    expectRefused(ServiceTesting::rawPost(service.port(), body,
-                                          std::string("Other=") + InProcessService::kTicket),
-                  403, "service ticket");
+    for (const std::string& cookie : {std::string(), std::string("OrvelWebApplication=guess"),
+                                      std::string("Other=") + InProcessService::kTicket}) {
+        expectRefused(ServiceTesting::rawPost(service.port(), storeBody("h", "n"), cookie), 403,
+                      "service ticket");
+    }
     expectRefused(
         ServiceTesting::rawPost(service.port(), "<ListItems><Host>*</Host></ListItems>", ""), 403,
         "service ticket");
@@ -146,17 +141,12 @@ TEST_F(BadInput, PathLikeNamesNeverLeaveTheStoreDirectory) {
     const auto outside = snapshot(parent);
     for (const char* name : {"..\\..\\x", "../x", "../../etc/x", "/x"}) {
         for (const char* host : {"h", "..", "../h"}) {
-            const RawAnswer stored = post(std::string("<Store><Host>") + host +
-                                          "</Host>"
-                                          "<ConfigurationName>" +
-                                          name +
-                                          "</ConfigurationName>"
-                                          "<Configuration>cGF0aA==</Configuration></Store>");
+            const RawAnswer stored =
+                post(storeBody(host, name, "<Configuration>cGF0aA==</Configuration>"));
             EXPECT_EQ(elementText(stored.body, "ReturnStatus"), "1") << stored.body;
-            const RawAnswer got = post(std::string("<Retrieve><Host>") + host +
-                                       "</Host>"
-                                       "<ConfigurationName>" +
-                                       name + "</ConfigurationName></Retrieve>");
+            const RawAnswer got =
+                post(std::string("<Retrieve><Host>") + host + "</Host><ConfigurationName>" + name +
+                     "</ConfigurationName></Retrieve>");
             EXPECT_EQ(elementText(got.body, "Configuration"), "cGF0aA==") << name;
         }
     }

@@ -10,9 +10,9 @@
 #include "InProcessService.h"
 #include "Quorvex/BDateTime.h"
 #include "Quorvex/Base64Coder.h"
+#include "Quorvex/TextConversion.h"
 #include "RawPost.h"
 #include "Vesk/XmlUtils.h"
-#include "repository/DirectoryStore.h"
 
 namespace ConfigurationService {
 namespace {
@@ -94,17 +94,6 @@ TEST(ServiceProtocol, StoresMillisecondsApartHaveDifferentTimes) {
     EXPECT_LT(BDateTime(first.c_str()), BDateTime(second.c_str()));
 }
 
-TEST(ServiceProtocol, ExistsAnswersOneOrZero) {
-    InProcessService service;
-    post(service, storeBody("h", "there", "AA=="));
-    EXPECT_EQ(
-        elementText(post(service, itemBody("Exists", "H", "there")).body, "ConfigurationExists"),
-        "1");
-    EXPECT_EQ(
-        elementText(post(service, itemBody("Exists", "h", "absent")).body, "ConfigurationExists"),
-        "0");
-}
-
 TEST(ServiceProtocol, MissingItemIsALegacyFailure) {
     InProcessService service;
     const RawAnswer answer = post(service, itemBody("Retrieve", "h", "absent"));
@@ -113,15 +102,10 @@ TEST(ServiceProtocol, MissingItemIsALegacyFailure) {
     EXPECT_NE(elementText(answer.body, "ErrorMessage").find("not found"), std::string::npos);
 }
 
-TEST(ServiceProtocol, ListItemsWithStarListsEveryHost) {
+TEST(ServiceProtocol, ListItemsOfAHostWithoutItemsIsAnEmptySuccess) {
     InProcessService service;
-    post(service, storeBody("a", "one", "AA=="));
-    post(service, storeBody("b", "two", "AA=="));
-    const RawAnswer all = post(service, "<ListItems><Host>*</Host></ListItems>");
-    EXPECT_NE(all.body.find("<HostName>a</HostName>"), std::string::npos);
-    EXPECT_NE(all.body.find("<HostName>b</HostName>"), std::string::npos);
-    const RawAnswer none = post(service, "<ListItems><Host>c</Host></ListItems>");
-    EXPECT_EQ(none.body, "<ListItemsResponse><ReturnStatus>1</ReturnStatus></ListItemsResponse>");
+    EXPECT_EQ(post(service, "<ListItems><Host>c</Host></ListItems>").body,
+              "<ListItemsResponse><ReturnStatus>1</ReturnStatus></ListItemsResponse>");
 }
 
 TEST(ServiceProtocol, RetrieveItemsAnswersOneTreeOfTheNamedDocuments) {
@@ -179,15 +163,10 @@ TEST(ServiceProtocol, RegisteredHostsAreListedOnceAndByModuleType) {
 TEST(ServiceProtocol, ServerInfoBlobIsAnEscapedElementTree) {
     InProcessService service;
     const RawAnswer answer = post(service, "<GetServerInfo></GetServerInfo>");
-    std::string blob = elementText(answer.body, "ServerInfoBlob");
-    for (const auto& entity :
-         {std::make_pair("&lt;", "<"), std::make_pair("&gt;", ">"), std::make_pair("&amp;", "&")}) {
-        for (std::size_t at; (at = blob.find(entity.first)) != std::string::npos;) {
-            blob.replace(at, std::string(entity.first).size(), entity.second);
-        }
-    }
+    ACE_CString blob;
+    Quorvex::ConvertXmlStringToString(elementText(answer.body, "ServerInfoBlob").c_str(), blob);
     Vesk::Element info;
-    Vesk::XmlUtils::parse(blob.data(), blob.size(), info);
+    Vesk::XmlUtils::parse(blob.c_str(), blob.length(), info);
     EXPECT_EQ(info.key(), "ServerInfo");
     EXPECT_EQ(info.getMultiElement().getElement("HostName").getSingle().value(), "TestHost");
     EXPECT_EQ(info.getMultiElement().getElement("IsMaster").getSingle().value(), "1");
@@ -201,27 +180,6 @@ TEST(ServiceProtocol, ChangeSignalsSetTheMachineEvent) {
         EXPECT_EQ(elementText(post(service, body).body, "ReturnStatus"), "1") << body;
         EXPECT_TRUE(event.wait(5000)) << body;
     }
-}
-
-TEST(ServiceProtocol, SiteSettingsArePersisted) {
-    InProcessService service;
-    EXPECT_EQ(elementText(post(service,
-                               "<SwitchoverPersistent><Persistent>Stack 2</Persistent>"
-                               "</SwitchoverPersistent>")
-                              .body,
-                          "ReturnStatus"),
-              "1");
-    EXPECT_EQ(elementText(post(service,
-                               "<EnableMergeNetworkCapture><Enable>1</Enable><Host>H</Host>"
-                               "</EnableMergeNetworkCapture>")
-                              .body,
-                          "ReturnStatus"),
-              "1");
-    ACE_CString value;
-    ASSERT_TRUE(service.server().store().setting("PersistentStorage", value));
-    EXPECT_EQ(value, "Stack 2");
-    ASSERT_TRUE(service.server().store().setting("MergeNetworkCapture:h", value));
-    EXPECT_EQ(value, "1");
 }
 
 // Guards against the HTTP library's default of closing a kept-alive connection after 5 requests.

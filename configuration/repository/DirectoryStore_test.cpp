@@ -5,6 +5,7 @@
 
 #include <filesystem>
 #include <fstream>
+#include <memory>
 #include <stdexcept>
 #include <thread>
 
@@ -28,6 +29,21 @@ void put(DirectoryStore& store, const char* host, const char* name, const std::s
     store.store(host, name, data.data(), data.size(), time);
 }
 
+// A scratch directory and the store on it; open() closes the previous store first, as a restart.
+class DirectoryStoreTest : public ::testing::Test {
+protected:
+    DirectoryStore& open() {
+        m_store.reset();
+        m_store = std::make_unique<DirectoryStore>(dir.path().c_str());
+        return *m_store;
+    }
+
+    ScratchDir dir;
+
+private:
+    std::unique_ptr<DirectoryStore> m_store;
+};
+
 std::vector<std::string> filesIn(const std::string& dir) {
     std::vector<std::string> names;
     for (const auto& entry : std::filesystem::directory_iterator(dir)) {
@@ -36,9 +52,8 @@ std::vector<std::string> filesIn(const std::string& dir) {
     return names;
 }
 
-TEST(DirectoryStore, KeepsBytesExactlyAndHostsWithoutCase) {
-    ScratchDir dir;
-    DirectoryStore store(dir.path().c_str());
+TEST_F(DirectoryStoreTest, KeepsBytesExactlyAndHostsWithoutCase) {
+    DirectoryStore& store = open();
     const std::string binary("\0\x01\xff<&>\n", 7);
     put(store, "Orvel1", "BrimmetServer\\Location", binary);
     EXPECT_EQ(bytesOf(store, "ORVEL1", "BrimmetServer\\Location"), binary);
@@ -48,9 +63,8 @@ TEST(DirectoryStore, KeepsBytesExactlyAndHostsWithoutCase) {
     EXPECT_EQ(store.list("OrVeL1")[0].host, "orvel1");  // the spelling of the last store
 }
 
-TEST(DirectoryStore, ListsOneHostOrAllHostsWithExactNames) {
-    ScratchDir dir;
-    DirectoryStore store(dir.path().c_str());
+TEST_F(DirectoryStoreTest, ListsOneHostOrAllHostsWithExactNames) {
+    DirectoryStore& store = open();
     put(store, "a", "X\\One", "1");
     put(store, "a", "X\\Two", "2");
     put(store, "b", "X\\One", "3");
@@ -62,9 +76,8 @@ TEST(DirectoryStore, ListsOneHostOrAllHostsWithExactNames) {
     EXPECT_TRUE(store.list("c").empty());
 }
 
-TEST(DirectoryStore, GivenTimesAreKeptAndOwnTimesAlwaysAdvance) {
-    ScratchDir dir;
-    DirectoryStore store(dir.path().c_str());
+TEST_F(DirectoryStoreTest, GivenTimesAreKeptAndOwnTimesAlwaysAdvance) {
+    DirectoryStore& store = open();
     put(store, "h", "fixed", "x", 1267679167089);
     StoredItem item;
     ASSERT_TRUE(store.retrieve("h", "fixed", item));
@@ -77,21 +90,18 @@ TEST(DirectoryStore, GivenTimesAreKeptAndOwnTimesAlwaysAdvance) {
     }
 }
 
-TEST(DirectoryStore, ReopenedStoreHasEveryItemTimeAndRegistration) {
-    ScratchDir dir;
-    std::int64_t time = 0;
-    {
-        DirectoryStore store(dir.path().c_str());
-        put(store, "Host", "A\\B", "payload");
-        time = store.list("host")[0].lastModifiedMs;
-        put(store, "host", "gone", "x");
-        EXPECT_TRUE(store.remove("HOST", "gone"));
-        store.registerService("Slave1", "Storage", "127.0.0.1:9000");
-        store.registerService("slave2", "Query", "");
-        EXPECT_TRUE(store.unregisterService("SLAVE2", "Query"));
-        store.setSetting("Persistent", "Stack 2");
-    }
-    DirectoryStore store(dir.path().c_str());
+TEST_F(DirectoryStoreTest, ReopenedStoreHasEveryItemTimeAndRegistration) {
+    DirectoryStore& first = open();
+    put(first, "Host", "A\\B", "payload");
+    const std::int64_t time = first.list("host")[0].lastModifiedMs;
+    put(first, "host", "gone", "x");
+    EXPECT_TRUE(first.remove("HOST", "gone"));
+    first.registerService("Slave1", "Storage", "127.0.0.1:9000");
+    first.registerService("slave2", "Query", "");
+    EXPECT_TRUE(first.unregisterService("SLAVE2", "Query"));
+    first.setSetting("Persistent", "Stack 2");
+
+    DirectoryStore& store = open();
     EXPECT_EQ(bytesOf(store, "host", "A\\B"), "payload");
     EXPECT_EQ(store.list("host")[0].lastModifiedMs, time);
     EXPECT_EQ(store.list("host")[0].host, "Host");
@@ -104,9 +114,8 @@ TEST(DirectoryStore, ReopenedStoreHasEveryItemTimeAndRegistration) {
     EXPECT_EQ(value, "Stack 2");
 }
 
-TEST(DirectoryStore, SecondStoreOnTheSameDirectoryIsRefused) {
-    ScratchDir dir;
-    DirectoryStore first(dir.path().c_str());
+TEST_F(DirectoryStoreTest, SecondStoreOnTheSameDirectoryIsRefused) {
+    open();
     EXPECT_THROW(DirectoryStore second(dir.path().c_str()), std::runtime_error);
 }
 
@@ -123,9 +132,8 @@ TEST(DirectoryStore, NamesThatLookLikePathsStayInsideTheDirectory) {
     EXPECT_EQ(bytesOf(store, "h", "/etc/x"), "c");
 }
 
-TEST(DirectoryStore, RefusesEmptyNamesNulAndTheWildcardHost) {
-    ScratchDir dir;
-    DirectoryStore store(dir.path().c_str());
+TEST_F(DirectoryStoreTest, RefusesEmptyNamesNulAndTheWildcardHost) {
+    DirectoryStore& store = open();
     EXPECT_THROW(put(store, "", "n", "x"), std::invalid_argument);
     EXPECT_THROW(put(store, "h", "", "x"), std::invalid_argument);
     EXPECT_THROW(put(store, "*", "n", "x"), std::invalid_argument);
@@ -134,75 +142,61 @@ TEST(DirectoryStore, RefusesEmptyNamesNulAndTheWildcardHost) {
 }
 
 // Guards against leftovers of a killed writer being read as items or piling up.
-TEST(DirectoryStore, TemporaryAndForeignFilesAreNeverItems) {
-    ScratchDir dir;
-    {
-        DirectoryStore store(dir.path().c_str());
-        put(store, "h", "kept", "good");
-    }
+TEST_F(DirectoryStoreTest, TemporaryAndForeignFilesAreNeverItems) {
+    put(open(), "h", "kept", "good");
     std::ofstream(dir.file(".__temp__99_1")) << "QVXITEM1\n1\nh\ntorn\n100\npartial";
     std::ofstream(dir.file("h~torn")) << "QVXITEM1\n1\nh\ntorn\n100\npartial";
     std::ofstream(dir.file("h~other")) << "QVXITEM1\n1\nh\nkept\n4\nfake";
-    DirectoryStore store(dir.path().c_str());
+    DirectoryStore& store = open();
     EXPECT_FALSE(std::filesystem::exists(dir.file(".__temp__99_1")));
     ASSERT_EQ(store.size(), 1u);
     EXPECT_EQ(bytesOf(store, "h", "kept"), "good");
 }
 
 // Guards against a reused temporary file keeping the tail of a longer earlier version.
-TEST(DirectoryStore, RewritesThatShrinkOrGrowKeepExactBytes) {
-    ScratchDir dir;
+TEST_F(DirectoryStoreTest, RewritesThatShrinkOrGrowKeepExactBytes) {
     const std::vector<std::string> versions = {std::string(10000, 'a'), "b", std::string(5000, 'c'),
                                                "dd", std::string(5000, 'e')};
     for (const std::string& version : versions) {
-        {
-            DirectoryStore store(dir.path().c_str());
-            for (int i = 0; i < 3; ++i) {
-                put(store, "h", "doc", std::string(7000, 'x'));
-                put(store, "h", "other", version);
-                put(store, "h", "doc", version);
-            }
-            EXPECT_EQ(bytesOf(store, "h", "doc"), version);
+        DirectoryStore& store = open();
+        for (int i = 0; i < 3; ++i) {
+            put(store, "h", "doc", std::string(7000, 'x'));
+            put(store, "h", "other", version);
+            put(store, "h", "doc", version);
         }
-        DirectoryStore store(dir.path().c_str());
         EXPECT_EQ(bytesOf(store, "h", "doc"), version);
-        EXPECT_EQ(bytesOf(store, "h", "other"), version);
+        DirectoryStore& reopened = open();
+        EXPECT_EQ(bytesOf(reopened, "h", "doc"), version);
+        EXPECT_EQ(bytesOf(reopened, "h", "other"), version);
     }
 }
 
-TEST(DirectoryStore, ConcurrentStoresAllLandOnDisk) {
-    ScratchDir dir;
-    {
-        DirectoryStore store(dir.path().c_str());
-        std::vector<std::thread> threads;
-        for (int t = 0; t < 4; ++t) {
-            threads.emplace_back([&store, t] {
-                for (int i = 0; i < 25; ++i) {
-                    const std::string name = "doc" + std::to_string(i);
-                    const std::string data = std::to_string(t) + ":" + std::to_string(i);
-                    put(store, ("host" + std::to_string(t)).c_str(), name.c_str(), data);
-                    put(store, "shared", "same", data);
-                }
-            });
-        }
-        for (std::thread& thread : threads) {
-            thread.join();
-        }
+TEST_F(DirectoryStoreTest, ConcurrentStoresAllLandOnDisk) {
+    DirectoryStore& writing = open();
+    std::vector<std::thread> threads;
+    for (int t = 0; t < 4; ++t) {
+        threads.emplace_back([&writing, t] {
+            for (int i = 0; i < 25; ++i) {
+                const std::string name = "doc" + std::to_string(i);
+                const std::string data = std::to_string(t) + ":" + std::to_string(i);
+                put(writing, ("host" + std::to_string(t)).c_str(), name.c_str(), data);
+                put(writing, "shared", "same", data);
+            }
+        });
     }
-    DirectoryStore store(dir.path().c_str());
+    for (std::thread& thread : threads) {
+        thread.join();
+    }
+    DirectoryStore& store = open();
     EXPECT_EQ(store.size(), 101u);
     EXPECT_EQ(bytesOf(store, "host3", "doc24"), "3:24");
     EXPECT_NE(bytesOf(store, "shared", "same"), "<missing>");
 }
 
-TEST(DirectoryStore, VeryLongNamesRoundTrip) {
-    ScratchDir dir;
+TEST_F(DirectoryStoreTest, VeryLongNamesRoundTrip) {
     const std::string longName = std::string(300, 'N') + "\\" + std::string(300, '%');
-    {
-        DirectoryStore store(dir.path().c_str());
-        put(store, "h", longName.c_str(), "long");
-    }
-    DirectoryStore store(dir.path().c_str());
+    put(open(), "h", longName.c_str(), "long");
+    DirectoryStore& store = open();
     EXPECT_EQ(bytesOf(store, "h", longName.c_str()), "long");
     EXPECT_EQ(store.list("h")[0].name, longName.c_str());
 }

@@ -28,19 +28,6 @@ public:
                               const ACE_CString& body, bool legacy) {
         client.CheckResponse(status, body, legacy);
     }
-    static const ACE_CString& configurationUrl(const HttpConfigurationClient& client) {
-        return client.m_configurationUrl;
-    }
-    static const ACE_CString& workflowUrl(const HttpConfigurationClient& client) {
-        return client.m_workflowUrl;
-    }
-    static const HttpConfigurationClient::CookieMap& cookies(
-        const HttpConfigurationClient& client) {
-        return client.m_cookies;
-    }
-    static int receiveTimeout(const HttpConfigurationClient& client) {
-        return client.m_receiveTimeout;
-    }
 };
 
 namespace Testing {

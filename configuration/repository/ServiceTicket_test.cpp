@@ -43,10 +43,6 @@ int fetch(ACE_CString& ticket) {
     return ServiceTicketModule::process().fetch(ticket);
 }
 
-TEST(ServiceTicketModule, TheProcessLoadedTheModule) {
-    ASSERT_TRUE(ServiceTicketModule::process().loaded());
-}
-
 TEST(ServiceTicketModule, ReadsTheTicketWithoutTheLineBreak) {
     TicketFile file;
     file.write(std::string(TICKET) + "\r\n");
@@ -81,27 +77,20 @@ TEST(ServiceTicketModule, RefusesTextThatCannotBeACookieValue) {
     }
 }
 
-TEST(ServiceTicketModule, AMissingModuleIsAnError) {
-    ServiceTicketModule module({"/nonexistent/libServerInterop.so"});
-    EXPECT_FALSE(module.loaded());
-    ACE_CString ticket;
-    try {
-        module.fetch(ticket);
-        FAIL();
-    } catch (const std::exception& e) {
-        EXPECT_STREQ("ServerInterop DLL is missing. Unable to get service ticket", e.what());
-    }
-}
-
-TEST(ServiceTicketModule, AModuleWithoutTheFunctionIsAnError) {
-    ServiceTicketModule module({"libz.so.1"});
-    ASSERT_TRUE(module.loaded());
-    ACE_CString ticket;
-    try {
-        module.fetch(ticket);
-        FAIL();
-    } catch (const std::exception& e) {
-        EXPECT_STREQ("Unable to export GetQuorvexServiceTicket from serverinterop.dll", e.what());
+TEST(ServiceTicketModule, AMissingModuleOrFunctionIsAnError) {
+    const std::pair<const char*, const char*> cases[] = {
+        {"/nonexistent/libServerInterop.so",
+         "ServerInterop DLL is missing. Unable to get service ticket"},
+        {"libz.so.1", "Unable to export GetQuorvexServiceTicket from serverinterop.dll"}};
+    for (const auto& c : cases) {
+        ServiceTicketModule module({c.first});
+        ACE_CString ticket;
+        try {
+            module.fetch(ticket);
+            ADD_FAILURE() << "no exception";
+        } catch (const std::exception& e) {
+            EXPECT_STREQ(c.second, e.what());
+        }
     }
 }
 
@@ -142,15 +131,16 @@ TEST_F(ServiceTicketClient, TheTicketBecomesTheCookieOfEveryRequest) {
     }
 }
 
-TEST_F(ServiceTicketClient, WithoutATicketTheClientGoesOnWithoutIt) {
-    makeTicketClient().signalRefresh();
-    EXPECT_EQ("Lang=de; OrvelWebApplication=from-caller", server().lastRequest().header("Cookie"));
-}
-
-TEST_F(ServiceTicketClient, AnInsecureTicketFileIsIgnored) {
-    m_file.write(TICKET, 0644);
-    makeTicketClient().signalRefresh();
-    EXPECT_EQ(std::string::npos, server().lastRequest().header("Cookie").find(TICKET));
+// A missing or insecure ticket file leaves the caller's cookie; the client goes on.
+TEST_F(ServiceTicketClient, WithoutAUsableTicketTheCallersCookieStays) {
+    for (const bool present : {false, true}) {
+        if (present) {
+            m_file.write(TICKET, 0644);
+        }
+        makeTicketClient().signalRefresh();
+        EXPECT_EQ("Lang=de; OrvelWebApplication=from-caller",
+                  server().lastRequest().header("Cookie"));
+    }
 }
 
 TEST_F(ServiceTicketClient, TheTicketNeverReachesTheLog) {

@@ -85,57 +85,38 @@ TEST(OrvelSystemDocument, CloneKeepsEveryKey) {
 
 TEST(OrvelSystemSetters, StudyHoursOutsideOneTo360BecomeTwentyFour) {
     OrvelSystemConfiguration config;
-    config.setStudyDateTimeDataProtectionHours(360);
-    EXPECT_EQ(360u, config.getStudyDateTimeDataProtectionHours());
-    config.setStudyDateTimeDataProtectionHours(1);
-    EXPECT_EQ(1u, config.getStudyDateTimeDataProtectionHours());
-    config.setStudyDateTimeDataProtectionHours(0);
-    EXPECT_EQ(24u, config.getStudyDateTimeDataProtectionHours());
-    config.setStudyDateTimeDataProtectionHours(361);
-    EXPECT_EQ(24u, config.getStudyDateTimeDataProtectionHours());
+    for (const auto& c : {std::make_pair(360u, 360u), {1u, 1u}, {0u, 24u}, {361u, 24u}}) {
+        config.setStudyDateTimeDataProtectionHours(c.first);
+        EXPECT_EQ(c.second, config.getStudyDateTimeDataProtectionHours()) << c.first;
+    }
 }
 
+// Days are 1..365, default 8; 0 is allowed only while auto-delete is off.
 TEST(OrvelSystemSetters, ZeroWorkstationDaysOnlyWhileAutoDeleteIsOff) {
     OrvelSystemConfiguration config;
-    config.setWorkstationDataProtectionDays(365);
-    EXPECT_EQ(365u, config.getWorkstationDataProtectionDays());
-    config.setWorkstationDataProtectionDays(0);
-    EXPECT_EQ(8u, config.getWorkstationDataProtectionDays());
-    config.setWorkstationDataProtectionDays(1);
-    EXPECT_EQ(1u, config.getWorkstationDataProtectionDays());
-    config.setWorkstationDataProtectionDays(366);
-    EXPECT_EQ(8u, config.getWorkstationDataProtectionDays());
-
-    config.setWorkstationAutoDeleteEnabled(false);
-    config.setWorkstationDataProtectionDays(0);
-    EXPECT_EQ(0u, config.getWorkstationDataProtectionDays());
-    config.setWorkstationDataProtectionDays(366);
-    EXPECT_EQ(8u, config.getWorkstationDataProtectionDays());
+    for (const bool autoDelete : {true, false}) {
+        config.setWorkstationAutoDeleteEnabled(autoDelete);
+        for (const auto& c :
+             {std::make_pair(365u, 365u), {0u, autoDelete ? 8u : 0u}, {1u, 1u}, {366u, 8u}}) {
+            config.setWorkstationDataProtectionDays(c.first);
+            EXPECT_EQ(c.second, config.getWorkstationDataProtectionDays()) << c.first;
+        }
+    }
 }
 
 TEST(OrvelSystemElement, WritesKeysInStoredOrder) {
     const auto element = customised().writeVesk();
     EXPECT_EQ("OrvelSystem", std::string(element->key().c_str()));
-    const std::vector<std::string> expected = {"FreespaceWatermark",
-                                               "WorkstationAutoDeleteEnabled",
-                                               "WorkstationDataProtectionDays",
-                                               "FileespaceWatermark",
-                                               "FreespaceWatermarkForStackRecycle",
-                                               "StudyDateTimeDataProtectionHours",
-                                               "Stack",
-                                               "Restart",
-                                               "VariationPoint",
-                                               "CORBAEndpoints",
-                                               "CORBAEndpoints",
-                                               "LogRoot",
-                                               "MasterConfigurationServiceHostName",
-                                               "EnableInversionTesting",
-                                               "OneTimeInitializationVerified",
-                                               "AvailableStoragePortCount",
-                                               "NumberOfConsolidationProcesses",
-                                               "ConsolidationWorkItemDefinition",
-                                               "AllowEmptyPatientFirstName"};
-    EXPECT_EQ(expected, childKeys(*element));
+    EXPECT_EQ(
+        (std::vector<std::string>{
+            "FreespaceWatermark", "WorkstationAutoDeleteEnabled", "WorkstationDataProtectionDays",
+            "FileespaceWatermark", "FreespaceWatermarkForStackRecycle",
+            "StudyDateTimeDataProtectionHours", "Stack", "Restart", "VariationPoint",
+            "CORBAEndpoints", "CORBAEndpoints", "LogRoot", "MasterConfigurationServiceHostName",
+            "EnableInversionTesting", "OneTimeInitializationVerified", "AvailableStoragePortCount",
+            "NumberOfConsolidationProcesses", "ConsolidationWorkItemDefinition",
+            "AllowEmptyPatientFirstName"}),
+        childKeys(*element));
     EXPECT_EQ("4", childText(*element, "FileespaceWatermark"));
     EXPECT_EQ("-5", childText(*element, "ConsolidationWorkItemDefinition"));
 }

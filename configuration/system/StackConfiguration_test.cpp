@@ -11,58 +11,44 @@ using Configuration::StackConfiguration__;
 using Quorvex::ScopedMachine;
 using Quorvex::Testing::FakeMachine;
 
-struct Directories {
-    std::string input;
-    std::string backup;
-    std::string mountPoint;
+struct DirectoryCase {
+    std::vector<ACE_CString> drives;
+    bool clusterNode;
+    const char* input;
+    const char* backup;
 };
 
-Directories defaultsOn(const FakeMachine& machine) {
+// The data drive is C: without drives, the only drive, else the second; a cluster node takes its
+// input from the shared disk I:.
+TEST(StackConfigurationDirectories, DefaultsFollowTheMachinesDrives) {
+    const DirectoryCase cases[] = {
+        {{}, false, "C:\\Quorvex\\input\\", "c:\\Quorvex\\"},
+        {{"E:\\"}, false, "E:\\Quorvex\\input\\", "E:\\Quorvex\\"},
+        {{"C:\\", "D:\\", "E:\\"}, false, "D:\\Quorvex\\input\\", "D:\\Quorvex\\"},
+        {{"C:\\", "D:\\"}, true, "I:\\Quorvex\\input\\", "D:\\Quorvex\\"}};
+    for (const DirectoryCase& c : cases) {
+        FakeMachine machine;
+        machine.drives = c.drives;
+        machine.clusterNode = c.clusterNode;
+        ScopedMachine scoped(machine);
+        const StackConfiguration__ stack;
+        EXPECT_STREQ(c.input, stack.getDICOMInputDirectory().c_str());
+        EXPECT_STREQ(c.backup, stack.getConfigBackupDirectoryName().c_str());
+        EXPECT_STREQ("C:\\Quorvex\\MultiStack\\", stack.getMountPointRootDirectory().c_str());
+    }
+}
+
+std::string mountPointOn(const FakeMachine& machine) {
     ScopedMachine scoped(machine);
-    const StackConfiguration__ stack;
-    return {stack.getDICOMInputDirectory().c_str(), stack.getConfigBackupDirectoryName().c_str(),
-            stack.getMountPointRootDirectory().c_str()};
-}
-
-TEST(StackConfigurationDirectories, MachineWithoutDrivesUsesDriveC) {
-    FakeMachine machine;
-    const Directories dirs = defaultsOn(machine);
-    EXPECT_EQ("C:\\Quorvex\\input\\", dirs.input);
-    EXPECT_EQ("c:\\Quorvex\\", dirs.backup);
-    EXPECT_EQ("C:\\Quorvex\\MultiStack\\", dirs.mountPoint);
-}
-
-TEST(StackConfigurationDirectories, SingleDriveHoldsTheData) {
-    FakeMachine machine;
-    machine.drives = {"E:\\"};
-    const Directories dirs = defaultsOn(machine);
-    EXPECT_EQ("E:\\Quorvex\\input\\", dirs.input);
-    EXPECT_EQ("E:\\Quorvex\\", dirs.backup);
-}
-
-TEST(StackConfigurationDirectories, SecondOfSeveralDrivesHoldsTheData) {
-    FakeMachine machine;
-    machine.drives = {"C:\\", "D:\\", "E:\\"};
-    const Directories dirs = defaultsOn(machine);
-    EXPECT_EQ("D:\\Quorvex\\input\\", dirs.input);
-    EXPECT_EQ("D:\\Quorvex\\", dirs.backup);
-}
-
-TEST(StackConfigurationDirectories, ClusterNodeTakesInputFromTheSharedDisk) {
-    FakeMachine machine;
-    machine.drives = {"C:\\", "D:\\"};
-    machine.clusterNode = true;
-    const Directories dirs = defaultsOn(machine);
-    EXPECT_EQ("I:\\Quorvex\\input\\", dirs.input);
-    EXPECT_EQ("D:\\Quorvex\\", dirs.backup);
+    return StackConfiguration__().getMountPointRootDirectory().c_str();
 }
 
 TEST(StackConfigurationDirectories, MountPointFollowsTheExecutablesDrive) {
     FakeMachine machine;
     machine.executable = "E:/Apps//Quorvex/server.exe";
-    EXPECT_EQ("E:\\Quorvex\\MultiStack\\", defaultsOn(machine).mountPoint);
+    EXPECT_EQ("E:\\Quorvex\\MultiStack\\", mountPointOn(machine));
     machine.executable = "\\\\store\\apps\\server.exe";
-    EXPECT_EQ("\\\\store\\apps\\Quorvex\\MultiStack\\", defaultsOn(machine).mountPoint);
+    EXPECT_EQ("\\\\store\\apps\\Quorvex\\MultiStack\\", mountPointOn(machine));
 }
 
 TEST(StackConfigurationElement, WritesEveryKeyInOrder) {
@@ -70,21 +56,16 @@ TEST(StackConfigurationElement, WritesEveryKeyInOrder) {
     ScopedMachine scoped(machine);
     const auto element = StackConfiguration__().writeVesk();
     EXPECT_EQ("Stack", std::string(element->key().c_str()));
-    const std::vector<std::string> expected = {"DICOMInputDirectory",
-                                               "ConfigBackupDirectoryName",
-                                               "ReconstructDirectoryName",
-                                               "MountPointRootDirectory",
-                                               "ReconstructDirectoryNeedsRebuild",
-                                               "ReconstructDirectoryNeedsReregistration",
-                                               "ReconstructDirectoryNeedsInternalReregistration",
-                                               "ReconstructDirectoryNeedsMigration",
-                                               "ReconstructDirectoryNeedsReArchive",
-                                               "ReconstructMigrationTarget",
-                                               "ReconstructMigrationOtherTargetName",
-                                               "ReconstructReregistrationQueue",
-                                               "ReconstructReregistrationOtherQueueName",
-                                               "VolDiscoveryMode"};
-    EXPECT_EQ(expected, Configuration::Testing::childKeys(*element));
+    EXPECT_EQ(
+        (std::vector<std::string>{
+            "DICOMInputDirectory", "ConfigBackupDirectoryName", "ReconstructDirectoryName",
+            "MountPointRootDirectory", "ReconstructDirectoryNeedsRebuild",
+            "ReconstructDirectoryNeedsReregistration",
+            "ReconstructDirectoryNeedsInternalReregistration", "ReconstructDirectoryNeedsMigration",
+            "ReconstructDirectoryNeedsReArchive", "ReconstructMigrationTarget",
+            "ReconstructMigrationOtherTargetName", "ReconstructReregistrationQueue",
+            "ReconstructReregistrationOtherQueueName", "VolDiscoveryMode"}),
+        Configuration::Testing::childKeys(*element));
     EXPECT_EQ("1", Configuration::Testing::childText(*element, "ReconstructReregistrationQueue"));
 }
 

@@ -12,11 +12,7 @@ TEST(BDate, TextRoundTrips) {
         EXPECT_TRUE(d.isValid()) << s;
         EXPECT_STREQ(s, d.ToString().c_str());
     }
-    const BDate d(2010, 3, 4);
-    EXPECT_EQ(BDate("2010-03-04"), d);
-    EXPECT_EQ(2010, d.year());
-    EXPECT_EQ(3, d.month());
-    EXPECT_EQ(4, d.day());
+    EXPECT_EQ(BDate("2010-03-04"), BDate(2010, 3, 4));
 }
 
 TEST(BDate, ImpossibleDatesAreInvalid) {

@@ -3,7 +3,6 @@
 #include <arpa/inet.h>
 #include <gtest/gtest.h>
 
-#include <cstdint>
 #include <cstdlib>
 #include <string>
 
@@ -25,13 +24,8 @@ TEST(HostTest, NamesComeFromTheCurrentMachine) {
     Quorvex::ScopedMachine scope(fake);
     EXPECT_EQ("orvel1", str(Quorvex::GetHostName(false)));
     EXPECT_EQ("orvel1.site.local", str(Quorvex::GetHostName(true)));
-}
-
-TEST(HostTest, FullyQualifiedNameWithoutDomainIsTheShortName) {
-    FakeMachine fake;
-    fake.domain = "";
-    Quorvex::ScopedMachine scope(fake);
-    EXPECT_EQ("testhost", str(Quorvex::GetHostName(true)));
+    fake.domain = "";  // without a domain the fully qualified name is the short name
+    EXPECT_EQ("orvel1", str(Quorvex::GetHostName(true)));
 }
 
 TEST(HostTest, LocalIPAddress) {
@@ -45,17 +39,6 @@ TEST(HostTest, LocalIPAddress) {
     address = "unchanged";
     EXPECT_NE(0, Quorvex::GetLocalIPAddress(address));
     EXPECT_EQ("unchanged", str(address));
-}
-
-TEST(HostTest, DrivesExecutableAndClusterFromTheCurrentMachine) {
-    FakeMachine fake;
-    fake.drives = {"C:\\", "D:\\"};
-    fake.clusterNode = true;
-    Quorvex::ScopedMachine scope(fake);
-    ASSERT_EQ(2u, Quorvex::GetLogicalDriveList().size());
-    EXPECT_EQ("D:\\", str(Quorvex::GetLogicalDriveList()[1]));
-    EXPECT_EQ("C:\\Program Files\\Quorvex\\bin\\server.exe", str(Quorvex::GetExecutablePath()));
-    EXPECT_TRUE(Quorvex::IsClusterNode());
 }
 
 TEST(HostTest, EnvironmentPrefersTheFakeThenInherits) {
@@ -77,15 +60,6 @@ TEST(HostTest, EnvironmentPrefersTheFakeThenInherits) {
 
     fake.inheritEnvironment = false;
     EXPECT_FALSE(Quorvex::GetEnvironmentVariable("PATH", value));
-}
-
-TEST(HostTest, FakeClockStartsFixedAndMovesOnlyWhenAdvanced) {
-    FakeMachine fake;
-    Quorvex::ScopedMachine scope(fake);
-    const std::int64_t start = Quorvex::CurrentMachine().nowMilliseconds();
-    EXPECT_EQ(1267679167000, start);  // 2010-03-04T05:06:07Z
-    fake.advanceMilliseconds(5 * 60 * 1000);
-    EXPECT_EQ(start + 300000, Quorvex::CurrentMachine().nowMilliseconds());
 }
 
 TEST(HostTest, RealMachineAnswers) {

@@ -100,12 +100,4 @@ TEST(PathsTest, Normalize) {
     }
 }
 
-// The mount-point default is built as normalize(concat(drive(exe), "Quorvex\MultiStack\")).
-TEST(PathsTest, MountPointRecipe) {
-    const ACE_CString exe = "D:\\Program Files\\Quorvex\\bin\\server.exe";
-    const ACE_CString mount = Quorvex::normalizePath(
-        Quorvex::concatPath(Quorvex::getDriveElement(exe), "Quorvex\\MultiStack\\"));
-    EXPECT_EQ("D:\\Quorvex\\MultiStack\\", str(mount));
-}
-
 }  // namespace

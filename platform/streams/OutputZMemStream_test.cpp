@@ -40,20 +40,16 @@ std::string compressInPieces(const std::string& text, std::size_t piece, std::si
     return plainUncompress(z, text.size());
 }
 
+// A complete RFC 1950 stream, also when nothing was written.
 TEST(ZStreamOutput, OutputIsAPlainZlibStream) {
-    const std::string text = "<Element key=\"DicomScp\"><Port>104</Port></Element>";
-    OutputZMemStream z;
-    z.write(text);
-    z.flush();
-    ASSERT_GE(z.size(), 2u);
-    EXPECT_EQ(0x78, z.data()[0]);  // deflate, 32 KiB window
-    EXPECT_EQ(text, plainUncompress(z, text.size()));
-}
-
-TEST(ZStreamOutput, EmptyStreamIsStillComplete) {
-    OutputZMemStream z;
-    z.flush();
-    EXPECT_EQ("", plainUncompress(z, 0));
+    for (const std::string text : {"<Element key=\"DicomScp\"><Port>104</Port></Element>", ""}) {
+        OutputZMemStream z;
+        z.write(text);
+        z.flush();
+        ASSERT_GE(z.size(), 2u);
+        EXPECT_EQ(0x78, z.data()[0]);  // deflate, 32 KiB window
+        EXPECT_EQ(text, plainUncompress(z, text.size()));
+    }
 }
 
 TEST(ZStreamOutput, LargeInputsGrowTheBufferFromATinyCapacity) {
