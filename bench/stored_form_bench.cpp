@@ -2,8 +2,8 @@
 // into an element tree) next to bare zlib with bare pugixml on the same XML text. Throughput is
 // reported as bytes of XML text per second; decode/bare is the figure to watch.
 #include <benchmark/benchmark.h>
-#include <pugixml.hpp>
 #include <zlib.h>
+#include <pugixml.hpp>
 
 #include <random>
 #include <string>
@@ -22,9 +22,12 @@ Vesk::Element makeDocument() {
     Vesk::MultiElementValue& children = root.addMultiElement();
     for (int i = 0; children.size() < 100000 && i < 4200; ++i) {
         Vesk::MultiElementValue& server = children.addElement("Server", {}, -1).addMultiElement();
-        server.addElement("HostName", {}, -1).addSingle().assign(
-            ("host-" + std::to_string(random() % 100000)).c_str());
-        server.addElement("Port", {}, -1).addSingle().assign(std::to_string(random() % 65536).c_str());
+        server.addElement("HostName", {}, -1)
+            .addSingle()
+            .assign(("host-" + std::to_string(random() % 100000)).c_str());
+        server.addElement("Port", {}, -1)
+            .addSingle()
+            .assign(std::to_string(random() % 65536).c_str());
         server.addElement("Enabled", {}, -1).addSingle().assign(random() % 2 ? "1" : "0");
         server.addElement("Path", {}, -1).addSingle().assign("D:\\Quorvex\\stack\\input\\");
         server.addElement("Description", {}, -1)

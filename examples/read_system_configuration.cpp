@@ -15,12 +15,13 @@ int main() {
         ConfigurationRepository* repository = ConfigurationRepository::instance();
         Configuration::OrvelSystemConfiguration system;
         if (repository->GetLatest(system) != 0) {
-            std::cerr << "no system configuration stored for " << repository->GetVirtualHostName().c_str()
-                      << "; showing the defaults\n";
+            std::cerr << "no system configuration stored for "
+                      << repository->GetVirtualHostName().c_str() << "; showing the defaults\n";
         }
         std::cout << "host " << repository->GetVirtualHostName().c_str() << ", master "
-                  << repository->GetMasterHostName().c_str() << (repository->IsMaster() ? " (us)" : "")
-                  << "\nDICOM input directory: " << system.getStack().getDICOMInputDirectory().c_str()
+                  << repository->GetMasterHostName().c_str()
+                  << (repository->IsMaster() ? " (us)" : "") << "\nDICOM input directory: "
+                  << system.getStack().getDICOMInputDirectory().c_str()
                   << "\nlast stored: " << system.timestamp().ToString().c_str() << "\n";
         OutputMemStream xml;
         Vesk::XmlUtils::streamOut(*system.writeVesk(), xml, Vesk::Ordering::indented());

@@ -27,7 +27,8 @@ int main(int argc, char** argv) {
     std::ofstream(file, std::ios::binary) << bytes;
 
     std::ifstream in(file, std::ios::binary);
-    const std::string stored((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
+    const std::string stored((std::istreambuf_iterator<char>(in)),
+                             std::istreambuf_iterator<char>());
     Vesk::Element tree;
     Configuration::StoredForm::decode(reinterpret_cast<const unsigned char*>(stored.data()),
                                       stored.size(), tree);

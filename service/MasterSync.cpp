@@ -10,7 +10,8 @@ namespace {
 std::vector<Configuration::_HttpConfigurationItemInfo> localItems(
     const Configuration::DirectoryStore& store) {
     std::vector<Configuration::_HttpConfigurationItemInfo> items;
-    for (const Configuration::StoredItem& item : store.list(Configuration::DirectoryStore::kAllHosts)) {
+    for (const Configuration::StoredItem& item :
+         store.list(Configuration::DirectoryStore::kAllHosts)) {
         items.push_back({item.host, item.name, TimeText::format(item.lastModifiedMs).c_str()});
     }
     return items;
@@ -20,8 +21,8 @@ std::vector<Configuration::_HttpConfigurationItemInfo> localItems(
 
 std::size_t MasterSync::run() {
     std::lock_guard<std::mutex> lock(m_running);
-    const auto missing =
-        Configuration::itemsMissingLocally(m_context.master.listItems(), localItems(m_context.store));
+    const auto missing = Configuration::itemsMissingLocally(m_context.master.listItems(),
+                                                            localItems(m_context.store));
     std::size_t copied = 0;
     for (const Configuration::_HttpConfigurationItemInfo& item : missing) {
         try {

@@ -217,7 +217,8 @@ Reply SiteOperations::changed(const Request& request) {
             QUORVEX_LOG(LM_DEBUG, "SiteOperations: %d changed documents copied from the master\n",
                         static_cast<int>(copied));
         } catch (const std::exception& e) {
-            QUORVEX_LOG(LM_ERROR, "SiteOperations: the master's documents could not be copied: %s\n",
+            QUORVEX_LOG(LM_ERROR,
+                        "SiteOperations: the master's documents could not be copied: %s\n",
                         e.what());
         }
     }

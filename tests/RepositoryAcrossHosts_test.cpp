@@ -73,8 +73,8 @@ protected:
     }
 
     ServiceProcess::Settings settings(const std::string& host, const std::string& masterAddress) {
-        return {scratch.file(host + "-store"), host, masterAddress, scratch.file(host + "-events"),
-                {}};
+        return {
+            scratch.file(host + "-store"), host, masterAddress, scratch.file(host + "-events"), {}};
     }
     static HttpConfigurationClient client(const ServiceProcess& service) {
         return HttpConfigurationClient(service.address().c_str(), true, false);

@@ -27,6 +27,8 @@ Quorvex::auto_ptr<Vesk::Element> AnonParam::writeVesk() const {
     return Fields::write(*this, kElement);
 }
 
-bool operator==(const AnonParam& a, const AnonParam& b) { return Fields::equal(a, b); }
+bool operator==(const AnonParam& a, const AnonParam& b) {
+    return Fields::equal(a, b);
+}
 
 }  // namespace Configuration

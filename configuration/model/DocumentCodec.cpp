@@ -13,9 +13,9 @@ Quorvex::auto_ptr<Vesk::Element> writeItem(const ACE_CString& name, ConfigDoc& d
     Quorvex::auto_ptr<Vesk::Element> tree = document.writeVesk();
     const std::string bytes = StoredForm::encode(*tree);
     document.timestamp(BDateTime::Now());
-    const int result = store(name, document.path(),
-                             reinterpret_cast<const unsigned char*>(bytes.data()), bytes.size(),
-                             document.timestamp());
+    const int result =
+        store(name, document.path(), reinterpret_cast<const unsigned char*>(bytes.data()),
+              bytes.size(), document.timestamp());
     if (result != 0) {
         tree.reset();
     }

@@ -2,17 +2,17 @@
 #include "DocumentCodec.h"
 
 #include <gtest/gtest.h>
-#include <pugixml.hpp>
 #include <zlib.h>
+#include <pugixml.hpp>
 
 #include <map>
 
 #include "Configuration/AnonParam.h"
 #include "Configuration/DocumentNames.h"
 #include "Configuration/StoredForm.h"
+#include "Quorvex/Machine.h"
 #include "model/TestDocument.h"
 #include "testing/FakeMachine.h"
-#include "Quorvex/Machine.h"
 
 namespace Configuration {
 namespace {
@@ -75,7 +75,8 @@ TEST(ConfigDocBasics, FreshDocumentAndStrictNewer) {
 }
 
 TEST(ConfigDocBasics, RegistryPrefixIsOneObjectEndingInBackslash) {
-    EXPECT_EQ(&ConfigDoc::getConfigurationRegistryPath(), &ConfigDoc::getConfigurationRegistryPath());
+    EXPECT_EQ(&ConfigDoc::getConfigurationRegistryPath(),
+              &ConfigDoc::getConfigurationRegistryPath());
     EXPECT_EQ(ConfigDoc::getConfigurationRegistryPath(), "BrimmetServer\\");
     EXPECT_EQ(TestDoc().path(), "BrimmetServer\\TestDoc");
     EXPECT_EQ(ACE_CString(DocumentNames::kHeartbeat), "Heartbeat");
@@ -112,9 +113,9 @@ TEST_F(DocumentCodecTest, StoredBytesInflateWithPlainZlibToXmlAStandardParserAcc
     const std::string& bytes = store.items.begin()->second.bytes;
     std::vector<unsigned char> text(1 << 16);
     uLongf len = text.size();
-    ASSERT_EQ(uncompress(text.data(), &len, reinterpret_cast<const Bytef*>(bytes.data()),
-                         bytes.size()),
-              Z_OK);
+    ASSERT_EQ(
+        uncompress(text.data(), &len, reinterpret_cast<const Bytef*>(bytes.data()), bytes.size()),
+        Z_OK);
     pugi::xml_document parsed;
     EXPECT_TRUE(parsed.load_buffer(text.data(), len));
 }

@@ -28,8 +28,7 @@ Lookup lookup(const Vesk::MultiElementValue& children, const char* key, const AC
 // Reads the child of key into field: no child keeps the field (false); a child without a value
 // resets it to its empty value; a text goes through convert(text, field).
 template <class T, class Convert>
-bool readText(const Vesk::MultiElementValue& children, const char* key, T& field,
-              Convert convert) {
+bool readText(const Vesk::MultiElementValue& children, const char* key, T& field, Convert convert) {
     const ACE_CString* text = nullptr;
     switch (lookup(children, key, text)) {
         case Lookup::Missing:
@@ -60,8 +59,7 @@ bool readStreamed(const Vesk::MultiElementValue& children, const char* key, T& f
 // Builds a date or time from the text.
 template <class T>
 bool readConstructed(const Vesk::MultiElementValue& children, const char* key, T& field) {
-    return readText(children, key, field,
-                    [](const ACE_CString& text, T& out) { out = T(text); });
+    return readText(children, key, field, [](const ACE_CString& text, T& out) { out = T(text); });
 }
 
 }  // namespace

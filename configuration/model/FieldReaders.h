@@ -18,7 +18,9 @@ namespace Configuration {
 namespace Fields {
 
 // A key as a non-owning ACE string: no allocation per look-up.
-inline ACE_CString keyOf(const char* key) { return ACE_CString(key, nullptr, false); }
+inline ACE_CString keyOf(const char* key) {
+    return ACE_CString(key, nullptr, false);
+}
 
 bool readField(const Vesk::MultiElementValue& children, const char* key, ACE_CString& field);
 bool readField(const Vesk::MultiElementValue& children, const char* key, bool& field);

@@ -27,9 +27,9 @@ namespace Fields {
 
 // The text a read failure is logged with, after the class name.
 enum class FailureForm {
-    Failed,                  // "::readVesk: Failed. Standard Exception: %s\n"
-    PartialDefaults,         // "::readVesk: Failed - Using partial defaults. Standard Exception: %s.\n"
-    PartialDefaultsNoStop,   // as PartialDefaults without the full stop
+    Failed,           // "::readVesk: Failed. Standard Exception: %s\n"
+    PartialDefaults,  // "::readVesk: Failed - Using partial defaults. Standard Exception: %s.\n"
+    PartialDefaultsNoStop,  // as PartialDefaults without the full stop
 };
 
 // Logs a caught read failure of className in the given form.

@@ -100,10 +100,9 @@ TEST(FieldsRoundTrip, KeysAreWrittenInDeclaredOrderWithListsRepeated) {
     for (const Vesk::Element& child : t->getMultiElement()) {
         keys.emplace_back(child.key().c_str());
     }
-    const std::vector<std::string> expected = {"Text", "Flag", "Number",    "Count",
-                                               "Port", "Date", "Time",      "Name",
-                                               "Name", "Name", "AnonParam", "Param",
-                                               "Param"};
+    const std::vector<std::string> expected = {"Text",      "Flag",  "Number", "Count", "Port",
+                                               "Date",      "Time",  "Name",   "Name",  "Name",
+                                               "AnonParam", "Param", "Param"};
     EXPECT_EQ(keys, expected);
 }
 
@@ -126,7 +125,8 @@ TEST(FieldsReading, ChildWithoutValueEmptiesTheFieldAndCountsAsRead) {
 
 TEST(FieldsReading, UnparsableTextLeavesTheFieldAndCountsAsRead) {
     Sample s;
-    Vesk::Element t = tree({{"Flag", "true"}, {"Number", "abc"}, {"Count", "x1"}, {"Port", "70000"}});
+    Vesk::Element t =
+        tree({{"Flag", "true"}, {"Number", "abc"}, {"Count", "x1"}, {"Port", "70000"}});
     s.readVesk(t);
     EXPECT_TRUE(s.flag);  // only "1"/"0" are flags
     EXPECT_EQ(s.number, -7);

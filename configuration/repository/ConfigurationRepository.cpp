@@ -2,8 +2,8 @@
 #include "Configuration/ConfigurationRepository.h"
 
 #include <ace/Guard_T.h>
-#include <ace/Object_Manager.h>
 #include <ace/OS_NS_strings.h>
+#include <ace/Object_Manager.h>
 #include <ace/Reactor.h>
 
 #include <atomic>
@@ -80,17 +80,16 @@ ConfigurationRepository::ConfigurationRepository(std::shared_ptr<ServiceConnecto
 
 ConfigurationRepository::~ConfigurationRepository() {
     if (m_registered) {
-        ACE_Reactor::instance()->remove_handler(m_changeEvent->handle(),
-                                                ACE_Event_Handler::READ_MASK |
-                                                    ACE_Event_Handler::DONT_CALL);
+        ACE_Reactor::instance()->remove_handler(
+            m_changeEvent->handle(), ACE_Event_Handler::READ_MASK | ACE_Event_Handler::DONT_CALL);
     }
 }
 
 void ConfigurationRepository::openChangeEvent() {
     try {
         m_changeEvent = std::make_unique<Common::NamedEvent>(kChangeEventName);
-        m_registered = ACE_Reactor::instance()->register_handler(
-                           m_changeEvent->handle(), this, ACE_Event_Handler::READ_MASK) == 0;
+        m_registered = ACE_Reactor::instance()->register_handler(m_changeEvent->handle(), this,
+                                                                 ACE_Event_Handler::READ_MASK) == 0;
     } catch (const std::exception&) {
         m_registered = false;
     }
@@ -189,9 +188,8 @@ Quorvex::auto_ptr<Vesk::Element> ConfigurationRepository::WriteItem(const ACE_CS
     return DocumentCodec::writeItem(
         name, document,
         [this](const ACE_CString& host, const ACE_CString& path, const unsigned char* bytes,
-               std::size_t length, const BDateTime& timestamp) {
-            return Store(host, path, bytes, length, timestamp);
-        });
+               std::size_t length,
+               const BDateTime& timestamp) { return Store(host, path, bytes, length, timestamp); });
 }
 
 int ConfigurationRepository::GetConfigCacheItemInfo(const ACE_CString& path,
@@ -225,7 +223,8 @@ int ConfigurationRepository::RefreshCache() {
         }
         return 0;
     } catch (const std::exception& e) {
-        QUORVEX_LOG(LM_DEBUG, "ConfigurationRepository::RefreshCache: Failed. Standard Exception: %s.\n",
+        QUORVEX_LOG(LM_DEBUG,
+                    "ConfigurationRepository::RefreshCache: Failed. Standard Exception: %s.\n",
                     e.what());
         return -1;
     }
@@ -251,12 +250,15 @@ int ConfigurationRepository::handle_signal(int, siginfo_t*, ucontext_t*) {
         m_changeEvent->reset();
     }
     RefreshCache();
-    QUORVEX_LOG(LM_DEBUG,
-                "ConfigurationRepository::handle_signal: Event QuorvexSlaveConfigurationChanged was "
-                "received.\n");
+    QUORVEX_LOG(
+        LM_DEBUG,
+        "ConfigurationRepository::handle_signal: Event QuorvexSlaveConfigurationChanged was "
+        "received.\n");
     return 0;
 }
 
-int ConfigurationRepository::handle_input(ACE_HANDLE) { return handle_signal(0); }
+int ConfigurationRepository::handle_input(ACE_HANDLE) {
+    return handle_signal(0);
+}
 
 }  // namespace Configuration

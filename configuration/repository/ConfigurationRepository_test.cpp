@@ -89,7 +89,8 @@ TEST_F(RepositoryTest, PerMachineDocumentsAreLookedUpUnderTheVirtualHost) {
 }
 
 TEST_F(RepositoryTest, OneCheckTimeThrottlesEveryDocument) {
-    local.put("master", "BrimmetServer\\Second", storedBytes("second", 2), "2010-01-01T00:00:00.000");
+    local.put("master", "BrimmetServer\\Second", storedBytes("second", 2),
+              "2010-01-01T00:00:00.000");
     auto repository = make();
     TestDocument a, b("Second");
     repository->GetLatest(a);
@@ -98,7 +99,8 @@ TEST_F(RepositoryTest, OneCheckTimeThrottlesEveryDocument) {
     const int before = local.timestamps;
     repository->GetLatest(a);  // the first request after five minutes checks...
     EXPECT_EQ(local.timestamps, before + 1);
-    local.put("master", "BrimmetServer\\Second", storedBytes("newer", 2), "2011-01-01T00:00:00.000");
+    local.put("master", "BrimmetServer\\Second", storedBytes("newer", 2),
+              "2011-01-01T00:00:00.000");
     minutes(1);
     TestDocument b2("Second");
     repository->GetLatest(b2);  // ...and the next one is served unchecked, though stale
@@ -159,7 +161,8 @@ TEST_F(RepositoryTest, DocumentMissingAKeyIsAnErrorAndNotCached) {
     TestDocument doc;
     EXPECT_EQ(repository->GetLatest(doc), -1);
     EXPECT_TRUE(log.containsFragment(
-        "ConfigurationRepository::ReadItem: Error reading configuration item BrimmetServer\\TestDoc. "
+        "ConfigurationRepository::ReadItem: Error reading configuration item "
+        "BrimmetServer\\TestDoc. "
         "Standard Exception: ConfigurationRepository::ReadItem: Error parsing configuration: "
         "BrimmetServer\\TestDoc\n"));
     ConfigCacheItemInfo info;
@@ -214,7 +217,8 @@ TEST_F(RepositoryTest, SignalChangedReachesEveryOtherHostAndSkipsTheLocalOne) {
     repository->SignalChanged();
     EXPECT_EQ(local.changed, 0);
     EXPECT_EQ(master.changed, 1);
-    EXPECT_TRUE(log.contains(LM_DEBUG, "ConfigurationRepository::SignalChanged: Signaling host master\n"));
+    EXPECT_TRUE(
+        log.contains(LM_DEBUG, "ConfigurationRepository::SignalChanged: Signaling host master\n"));
     EXPECT_TRUE(log.containsFragment(
         "ConfigurationRepository::SignalChanged: Unable to signal configuration changed to host "
         "slave2. Standard Exception: service slave2 unreachable"));

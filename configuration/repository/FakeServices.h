@@ -22,13 +22,12 @@ struct FakeService {
         std::string bytes;
         std::string time;
     };
-    std::string name;                             // the host name the service reports
+    std::string name;                                           // the host name the service reports
     std::map<std::pair<std::string, std::string>, Item> items;  // (host, name)
-    std::vector<ACE_CString> hosts;               // answer of listHosts
+    std::vector<ACE_CString> hosts;                             // answer of listHosts
     std::atomic<bool> down{false};
     std::mutex mutex;  // guards items and registrations
-    std::atomic<int> retrieves{0}, timestamps{0}, stores{0}, changed{0}, refreshes{0},
-        restarts{0};
+    std::atomic<int> retrieves{0}, timestamps{0}, stores{0}, changed{0}, refreshes{0}, restarts{0};
     std::vector<std::string> registrations;
 
     void check() {
@@ -52,7 +51,10 @@ struct FakeService {
 
 class FakeConnection : public ServiceConnection {
 public:
-    explicit FakeConnection(FakeService& s) : m_s(s) { m_s.check(); m_name = s.name.c_str(); }
+    explicit FakeConnection(FakeService& s) : m_s(s) {
+        m_s.check();
+        m_name = s.name.c_str();
+    }
     const ACE_CString& hostName() const override { return m_name; }
     void retrieve(const ACE_CString& host, const ACE_CString& n, Quorvex::ByteArray& data,
                   std::size_t& length) override {
@@ -134,7 +136,9 @@ class FakeConnector : public ServiceConnector {
 public:
     explicit FakeConnector(std::string localHost) : m_local(std::move(localHost)) {}
     void add(const std::string& host, FakeService& service) { m_services[lower(host)] = &service; }
-    std::unique_ptr<ServiceConnection> connectLocal() const override { return connect(m_local.c_str()); }
+    std::unique_ptr<ServiceConnection> connectLocal() const override {
+        return connect(m_local.c_str());
+    }
     std::unique_ptr<ServiceConnection> connect(const ACE_CString& host) const override {
         const auto it = m_services.find(lower(host.c_str()));
         if (it == m_services.end()) {
@@ -145,7 +149,8 @@ public:
 
 private:
     static std::string lower(std::string s) {
-        for (char& c : s) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+        for (char& c : s)
+            c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
         return s;
     }
     std::string m_local;

@@ -9,7 +9,7 @@
 namespace Configuration {
 
 class HttpServiceConnection : public ServiceConnection {
-  public:
+public:
     // Builds the client (which asks the server for its host names unless already known).
     HttpServiceConnection(const ACE_CString& server, bool useHttps);
 
@@ -31,17 +31,17 @@ class HttpServiceConnection : public ServiceConnection {
     void signalRestart() override;
     void signalRefresh() override;
 
-  private:
+private:
     HttpConfigurationClient m_client;
 };
 
 class HttpServiceConnector : public ServiceConnector {
-  public:
+public:
     explicit HttpServiceConnector(ServiceLocation location);
     std::unique_ptr<ServiceConnection> connectLocal() const override;
     std::unique_ptr<ServiceConnection> connect(const ACE_CString& host) const override;
 
-  private:
+private:
     ServiceLocation m_location;
 };
 

@@ -49,8 +49,7 @@ TEST(RepositoryConcurrency, ReadersWritersAndRefreshersShareOneRepository) {
         threads.emplace_back([&, t] {
             for (int i = 0; i < 150; ++i) {
                 TestDocument doc(names[(t + i) % 3]);
-                if (repository.GetLatest(doc, i % 17 == 0) != 0 ||
-                    doc.size != doc.name.length()) {
+                if (repository.GetLatest(doc, i % 17 == 0) != 0 || doc.size != doc.name.length()) {
                     ++failures;
                 }
                 if (t == 0 && i % 10 == 0) {

@@ -71,7 +71,9 @@ int ConfigurationRepository::RegisterService(const ACE_CString& serviceName,
         serviceName.c_str());
 }
 
-int ConfigurationRepository::UnregisterService(const ACE_CString&) { return 0; }
+int ConfigurationRepository::UnregisterService(const ACE_CString&) {
+    return 0;
+}
 
 int ConfigurationRepository::ListServers(std::vector<ACE_CString>& servers) {
     return guarded([&] { m_connector->connect(m_virtualHostName)->listHosts(servers); },

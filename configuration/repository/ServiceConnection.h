@@ -23,9 +23,8 @@ public:
     virtual const ACE_CString& hostName() const = 0;
     virtual void retrieve(const ACE_CString& host, const ACE_CString& name,
                           Quorvex::ByteArray& data, std::size_t& length) = 0;
-    virtual void store(const ACE_CString& host, const ACE_CString& name,
-                       const unsigned char* data, std::size_t length,
-                       const ACE_CString& lastModifiedTime) = 0;
+    virtual void store(const ACE_CString& host, const ACE_CString& name, const unsigned char* data,
+                       std::size_t length, const ACE_CString& lastModifiedTime) = 0;
     virtual void getTimeStamp(const ACE_CString& host, const ACE_CString& name,
                               BDateTime& timestamp) = 0;
     virtual void listHosts(std::vector<ACE_CString>& hosts) = 0;

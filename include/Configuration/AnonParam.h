@@ -42,6 +42,8 @@ private:
 };
 
 CONFIGURATION_API bool operator==(const AnonParam& a, const AnonParam& b);
-inline bool operator!=(const AnonParam& a, const AnonParam& b) { return !(a == b); }
+inline bool operator!=(const AnonParam& a, const AnonParam& b) {
+    return !(a == b);
+}
 
 }  // namespace Configuration

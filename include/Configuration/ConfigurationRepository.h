@@ -108,7 +108,8 @@ public:
     void List(std::vector<std::pair<ACE_CString, BDateTime>>& items) const;
 
     // The change event fired: reset it and refresh the cache.
-    int handle_signal(int signum, siginfo_t* info = nullptr, ucontext_t* context = nullptr) override;
+    int handle_signal(int signum, siginfo_t* info = nullptr,
+                      ucontext_t* context = nullptr) override;
     // The event's descriptor became readable (the reactor's call): as handle_signal.
     int handle_input(ACE_HANDLE handle) override;
 

@@ -32,7 +32,7 @@
 namespace Configuration {
 
 class CONFIGURATION_API OrvelSystemConfiguration : public TypedConfigDoc<OrvelSystemConfiguration> {
-  public:
+public:
     // The per-machine document "OrvelSystem" with every key at its default.
     OrvelSystemConfiguration();
     OrvelSystemConfiguration(const OrvelSystemConfiguration& other);
@@ -122,7 +122,7 @@ class CONFIGURATION_API OrvelSystemConfiguration : public TypedConfigDoc<OrvelSy
     bool isAllowEmptyPatientFirstName() const { return m_allowEmptyPatientFirstName; }
     void setAllowEmptyPatientFirstName(bool value) { m_allowEmptyPatientFirstName = value; }
 
-  private:
+private:
     friend struct Fields::Access;
     template <class Self, class Io>
     static void fields(Self& self, Io& io);

@@ -17,7 +17,7 @@
 namespace Configuration {
 
 class CONFIGURATION_API RestartConfiguration__ : public virtual Vesk::Serializable {
-  public:
+public:
     RestartConfiguration__();
     RestartConfiguration__(const RestartConfiguration__& other);
     RestartConfiguration__& operator=(const RestartConfiguration__& other);
@@ -35,7 +35,7 @@ class CONFIGURATION_API RestartConfiguration__ : public virtual Vesk::Serializab
     unsigned int getRestartNumberOfDaysBetween() const { return m_restartNumberOfDaysBetween; }
     void setRestartNumberOfDaysBetween(unsigned int value) { m_restartNumberOfDaysBetween = value; }
 
-  private:
+private:
     friend struct Fields::Access;
     template <class Self, class Io>
     static void fields(Self& self, Io& io);

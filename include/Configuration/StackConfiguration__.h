@@ -24,7 +24,7 @@
 namespace Configuration {
 
 class CONFIGURATION_API StackConfiguration__ : public virtual Vesk::Serializable {
-  public:
+public:
     // Every key at its default; the directories come from this machine's drives.
     StackConfiguration__();
     StackConfiguration__(const StackConfiguration__& other);
@@ -95,7 +95,7 @@ class CONFIGURATION_API StackConfiguration__ : public virtual Vesk::Serializable
     unsigned int getVolDiscoveryMode() const { return m_volDiscoveryMode; }
     void setVolDiscoveryMode(unsigned int value) { m_volDiscoveryMode = value; }
 
-  private:
+private:
     friend struct Fields::Access;
     template <class Self, class Io>
     static void fields(Self& self, Io& io);

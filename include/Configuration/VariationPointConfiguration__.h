@@ -17,7 +17,7 @@
 namespace Configuration {
 
 class CONFIGURATION_API VariationPointConfiguration__ : public virtual Vesk::Serializable {
-  public:
+public:
     VariationPointConfiguration__();
     VariationPointConfiguration__(const VariationPointConfiguration__& other);
     VariationPointConfiguration__& operator=(const VariationPointConfiguration__& other);
@@ -41,7 +41,7 @@ class CONFIGURATION_API VariationPointConfiguration__ : public virtual Vesk::Ser
     // True when text names neither of the two standard storage service lists.
     static bool isStorageCommitServiceListValueCustom(const ACE_CString& text);
 
-  private:
+private:
     friend struct Fields::Access;
     template <class Self, class Io>
     static void fields(Self& self, Io& io);

@@ -8,10 +8,10 @@
 
 #include <cerrno>
 
-#define QUORVEX_LOG(priority, ...)                                             \
-    do {                                                                       \
-        const int quorvexErrno = errno;                                        \
-        ACE_Log_Msg* quorvexLog = ACE_Log_Msg::instance();                     \
-        quorvexLog->conditional_set(__FILE__, __LINE__, -1, quorvexErrno);     \
-        quorvexLog->log(priority, __VA_ARGS__);                                \
+#define QUORVEX_LOG(priority, ...)                                         \
+    do {                                                                   \
+        const int quorvexErrno = errno;                                    \
+        ACE_Log_Msg* quorvexLog = ACE_Log_Msg::instance();                 \
+        quorvexLog->conditional_set(__FILE__, __LINE__, -1, quorvexErrno); \
+        quorvexLog->log(priority, __VA_ARGS__);                            \
     } while (0)

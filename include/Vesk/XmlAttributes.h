@@ -11,7 +11,9 @@ namespace Vesk {
 class XmlAttributes {
 public:
     // Appends an attribute.
-    void add(const ACE_CString& name, const ACE_CString& value) { m_items.emplace_back(name, value); }
+    void add(const ACE_CString& name, const ACE_CString& value) {
+        m_items.emplace_back(name, value);
+    }
     const std::vector<std::pair<ACE_CString, ACE_CString>>& items() const { return m_items; }
     bool empty() const { return m_items.empty(); }
 

@@ -19,7 +19,7 @@
 namespace Vesk {
 namespace XmlUtils {
 
-constexpr int kMaxDepth = 200;                      // element nesting, counting value levels
+constexpr int kMaxDepth = 200;                     // element nesting, counting value levels
 constexpr std::size_t kMaxTextBytes = 256u << 20;  // 256 MiB of XML text
 
 // Reads one tree from in into out (out's previous contents are replaced). If name is not empty

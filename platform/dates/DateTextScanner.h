@@ -25,7 +25,7 @@ struct ClockFields {
 };
 
 class Scanner {
-  public:
+public:
     Scanner(const char* text, std::size_t len) : m_p(text), m_end(text + len) {}
 
     // "YYYY-MM-DD" with exactly those digit counts; ranges are not checked.
@@ -39,7 +39,7 @@ class Scanner {
     bool literal(char c);
     bool atEnd() const { return m_p == m_end; }
 
-  private:
+private:
     // Between minCount and maxCount decimal digits (as many as are there), as a number.
     bool digits(int minCount, int maxCount, std::int64_t& value);
     bool digits(int count, int& value);

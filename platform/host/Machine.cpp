@@ -1,10 +1,10 @@
 // The real Linux machine, and the switch that lets tests install another.
 #include "Quorvex/Machine.h"
 
+#include <arpa/inet.h>
 #include <ifaddrs.h>
 #include <netdb.h>
 #include <netinet/in.h>
-#include <arpa/inet.h>
 #include <unistd.h>
 
 #include <atomic>
@@ -79,7 +79,9 @@ bool Machine::localIPAddress(ACE_CString& address) const {
     return found;
 }
 
-std::vector<ACE_CString> Machine::logicalDrives() const { return {}; }
+std::vector<ACE_CString> Machine::logicalDrives() const {
+    return {};
+}
 
 ACE_CString Machine::executablePath() const {
     char buf[PATH_MAX + 1] = {};
@@ -87,7 +89,9 @@ ACE_CString Machine::executablePath() const {
     return n > 0 ? ACE_CString(buf, static_cast<ACE_CString::size_type>(n)) : ACE_CString();
 }
 
-bool Machine::isClusterNode() const { return false; }
+bool Machine::isClusterNode() const {
+    return false;
+}
 
 bool Machine::environment(const char* name, ACE_CString& value) const {
     const char* v = std::getenv(name);
@@ -111,6 +115,8 @@ const Machine& CurrentMachine() {
 ScopedMachine::ScopedMachine(const Machine& machine)
     : m_previous(current().exchange(&machine, std::memory_order_acq_rel)) {}
 
-ScopedMachine::~ScopedMachine() { current().store(m_previous, std::memory_order_release); }
+ScopedMachine::~ScopedMachine() {
+    current().store(m_previous, std::memory_order_release);
+}
 
 }  // namespace Quorvex

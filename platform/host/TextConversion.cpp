@@ -64,7 +64,7 @@ std::size_t replacedLength(const unsigned char* p, std::size_t available) {
 
 // An iconv descriptor for one conversion, closed at the end of the scope.
 class Converter {
-  public:
+public:
     Converter() : m_cd(iconv_open("ISO-8859-1", "UTF-8")) {
         if (m_cd == reinterpret_cast<iconv_t>(-1)) {
             throw std::runtime_error("ConvertUTF8StringToAnsi: iconv_open failed");
@@ -75,7 +75,7 @@ class Converter {
     Converter& operator=(const Converter&) = delete;
     iconv_t get() const { return m_cd; }
 
-  private:
+private:
     iconv_t m_cd;
 };
 

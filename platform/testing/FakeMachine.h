@@ -35,7 +35,7 @@ public:
     ACE_CString executable = "C:\\Program Files\\Quorvex\\bin\\server.exe";
     bool clusterNode = false;
     std::map<std::string, std::string> env;  // consulted first
-    bool inheritEnvironment = true;           // then the real environment
+    bool inheritEnvironment = true;          // then the real environment
 
 private:
     std::atomic<std::int64_t> m_now;

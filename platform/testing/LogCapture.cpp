@@ -13,7 +13,7 @@ namespace {
 
 // Installed process-wide while the capture lives; remembers the backend it replaced.
 class CaptureBackend : public ACE_Log_Msg_Backend {
-  public:
+public:
     explicit CaptureBackend(LogCapture& owner) : previous(nullptr), m_owner(owner) {}
 
     ACE_Log_Msg_Backend* previous;
@@ -27,7 +27,7 @@ class CaptureBackend : public ACE_Log_Msg_Backend {
         return 0;
     }
 
-  private:
+private:
     LogCapture& m_owner;
 };
 
