@@ -27,7 +27,7 @@ bin="$root/build"
 service=$!
 trap 'kill -TERM $service 2>/dev/null; wait $service 2>/dev/null' EXIT INT TERM
 
-ctl="$bin/tools/configctl/configctl --server 127.0.0.1:$port"
+ctl="$bin/tools/configctl --server 127.0.0.1:$port"
 for _ in $(seq 1 100); do
   $ctl hosts >/dev/null 2>&1 && break
   sleep 0.1
