@@ -1,18 +1,22 @@
-// The library's HttpConfigurationClient against the real configuration service: documents in and
-// out, listings, site switches, and the failures as the client reports them. (Each operation's
-// request and answer texts are pinned on both sides by the client's and the service's own tests.)
+// The library's HttpConfigurationClient against the real configuration service: every
+// configuration operation, and the failures as the client reports them.
 #include <gtest/gtest.h>
 
+#include "Common/NamedEvent.h"
 #include "Configuration/HttpConfigurationClient.h"
-#include "Configuration/HttpConfigurationException.h"
+#include "Configuration/HttpConfigurationPathNotFoundException.h"
+#include "Configuration/StoredForm.h"
 #include "InProcessService.h"
 #include "Quorvex/BDateTime.h"
+#include "Vesk/XmlUtils.h"
 #include "repository/DirectoryStore.h"
 
 namespace Configuration {
 namespace {
 
 using ServiceTesting::InProcessService;
+
+const char kEvent[] = "Global\\QuorvexSlaveConfigurationChanged";
 
 class ClientAgainstService : public ::testing::Test {
 protected:
@@ -27,6 +31,17 @@ protected:
     InProcessService service;
     HttpConfigurationClient client;
 };
+
+Vesk::Element tree(const char* key, const char* value) {
+    Vesk::Element root(key);
+    root.addMultiElement().addElement("Value", {}, -1).addSingle().assign(value);
+    return root;
+}
+
+TEST_F(ClientAgainstService, KnowsTheServiceAndItsMaster) {
+    EXPECT_EQ(client.hostName(), "TestHost");
+    EXPECT_EQ(client.masterHostName(), "TestHost");
+}
 
 TEST_F(ClientAgainstService, StoreRetrieveExistsAndTimeStamp) {
     const std::string bytes("\0\x01\xfe\xff binary", 11);
@@ -72,6 +87,21 @@ TEST_F(ClientAgainstService, MissingDocumentsRaiseTheClientsExceptions) {
     }
 }
 
+TEST_F(ClientAgainstService, RetrieveAllConfigurationsAnswersTheTrees) {
+    const std::string one = StoredForm::encode(tree("One", "1"));
+    const std::string two = StoredForm::encode(tree("Two", "2"));
+    store("h", "X\\One", one);
+    store("h", "X\\Two", two);
+    const ACE_CString answer = client.retrieveAllConfigurations("h", "X\\One;X\\Two");
+    Vesk::Element root;
+    Vesk::XmlUtils::parse(answer.c_str(), answer.length(), root);
+    ASSERT_EQ(root.getMultiElement().size(), 2u);
+    auto item = root.getMultiElement().begin();
+    EXPECT_EQ(*item->getMultiElement().begin(), tree("One", "1"));
+    ++item;
+    EXPECT_EQ(*item->getMultiElement().begin(), tree("Two", "2"));
+}
+
 TEST_F(ClientAgainstService, ListItemsOfOneHostAndOfAll) {
     store("a", "One", "1");
     store("b", "Two", "2");
@@ -84,6 +114,19 @@ TEST_F(ClientAgainstService, ListItemsOfOneHostAndOfAll) {
     EXPECT_EQ(items.size(), 2u);
 }
 
+TEST_F(ClientAgainstService, RegisteredServicesMakeTheHostList) {
+    client.registerService("Slave1", "Storage", "ModuleType=7;Port=104");
+    client.registerService(client.hostName(), "Query", "ModuleType=8");
+    std::vector<ACE_CString> hosts;
+    client.listHosts(hosts);
+    EXPECT_EQ(hosts, (std::vector<ACE_CString>{"Slave1", "TestHost"}));
+    client.listHostsByModuleType(7, hosts);
+    EXPECT_EQ(hosts, std::vector<ACE_CString>{"Slave1"});
+    client.unregisterService("Query");  // of the service's own host
+    client.listHosts(hosts);
+    EXPECT_EQ(hosts, std::vector<ACE_CString>{"Slave1"});
+}
+
 TEST_F(ClientAgainstService, SiteSwitchesAreKept) {
     client.switchoverPersistent("Stack <2> & more");
     client.enableMergeNetworkCapture(false, "Slave1");
@@ -94,10 +137,28 @@ TEST_F(ClientAgainstService, SiteSwitchesAreKept) {
     EXPECT_EQ(value, "0");
 }
 
+TEST_F(ClientAgainstService, ServerInformationIsAnElementTree) {
+    const ACE_CString text = client.getServerInformation();
+    Vesk::Element info;
+    Vesk::XmlUtils::parse(text.c_str(), text.length(), info);
+    EXPECT_EQ(info.getMultiElement().getElement("HostName").getSingle().value(), "TestHost");
+}
+
+TEST_F(ClientAgainstService, SignalsSetTheMachineEvent) {
+    Common::NamedEvent event(kEvent);
+    client.signalChanged();
+    EXPECT_TRUE(event.wait(5000));
+    event.reset();
+    client.signalRefresh();
+    EXPECT_TRUE(event.wait(5000));
+    event.reset();
+    client.signalRestart();
+    EXPECT_TRUE(event.wait(5000));
+}
+
 TEST_F(ClientAgainstService, WithoutTheTicketNothingIsStored) {
     HttpConfigurationClient stranger(service.address().c_str(), false, false);
     EXPECT_EQ(stranger.hostName(), "TestHost");  // the host names need no ticket
-    EXPECT_EQ(stranger.masterHostName(), "TestHost");
     EXPECT_THROW(stranger.store("h", "n", reinterpret_cast<const unsigned char*>("x"), 1, ""),
                  HttpConfigurationException);
     std::vector<ACE_CString> hosts;
