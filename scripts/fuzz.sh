@@ -1,7 +1,8 @@
 #!/usr/bin/env bash
 # Builds the libFuzzer targets with clang and runs each for a bounded time (not part of CI).
 #   scripts/fuzz.sh [SECONDS_PER_TARGET] [TARGET...]     (default 60 s, every target)
-# Corpora are kept in fuzz-out/<target>/, crashes in fuzz-out/<target>-crashes/.
+# Corpora are kept in fuzz-out/<target>/ (seeded from fuzz/seeds/<target>/ where present),
+# crashes in fuzz-out/<target>-crashes/.
 set -euo pipefail
 root=$(cd "$(dirname "$0")/.." && pwd)
 seconds=${1:-60}
@@ -17,6 +18,8 @@ for t in "${targets[@]}"; do
   crashes="$root/fuzz-out/$t-crashes"
   mkdir -p "$corpus" "$crashes"
   echo "=== $t for ${seconds}s"
+  seeds=()
+  [ -d "$root/fuzz/seeds/$t" ] && seeds=("$root/fuzz/seeds/$t")
   "$root/build-fuzz/fuzz/$t" -max_total_time="$seconds" -max_len=65536 -rss_limit_mb=2048 \
-    -artifact_prefix="$crashes/" -print_final_stats=1 "$corpus" 2>&1 | tail -n 12
+    -artifact_prefix="$crashes/" -print_final_stats=1 "$corpus" "${seeds[@]}" 2>&1 | tail -n 12
 done
