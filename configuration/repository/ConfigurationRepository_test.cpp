@@ -39,11 +39,8 @@ protected:
         connector->add("master", master);
         connector->add("slave2", other);
         local.put("master", kPath, storedBytes("first", 1), "2010-01-01T00:00:00.000");
-    }
-    std::unique_ptr<ConfigurationRepository> make(const char* masterName = "master") {
-        auto repository = std::make_unique<ConfigurationRepository>(connector);
-        repository->SetMasterHostName(masterName);
-        return repository;
+        repository = std::make_unique<ConfigurationRepository>(connector);
+        repository->SetMasterHostName("master");
     }
     void minutes(int n) { machine.advanceMilliseconds(n * 60000LL); }
 
@@ -52,16 +49,13 @@ protected:
     Quorvex::ScopedMachine scoped{machine};
     FakeService local, master, other;
     std::shared_ptr<FakeConnector> connector = std::make_shared<FakeConnector>("testhost");
+    std::unique_ptr<ConfigurationRepository> repository;
 };
 
-TEST_F(RepositoryTest, VirtualHostIsWhatTheLocalServiceReports) {
-    auto repository = make();
+TEST_F(RepositoryTest, VirtualHostIsWhatTheLocalServiceReportsAndEmptyMasterNamesIt) {
     EXPECT_EQ(repository->GetVirtualHostName(), "slave1");
     EXPECT_FALSE(repository->IsMaster());
-}
-
-TEST_F(RepositoryTest, EmptyMasterNameMakesTheMachineItsOwnMaster) {
-    auto repository = make("");
+    repository->SetMasterHostName("");
     EXPECT_EQ(repository->GetMasterHostName(), "slave1");
     EXPECT_TRUE(repository->IsMaster());
     repository->SetMasterHostName("SLAVE1");
@@ -69,7 +63,7 @@ TEST_F(RepositoryTest, EmptyMasterNameMakesTheMachineItsOwnMaster) {
 }
 
 TEST_F(RepositoryTest, FirstReadFillsTheDocumentAndCachesIt) {
-    auto repository = make();
+    local.put("slave1", "BrimmetServer\\Mine", storedBytes("local", 3), "2010-01-01T00:00:00.000");
     TestDocument doc;
     ASSERT_EQ(repository->GetLatest(doc), 0);
     EXPECT_EQ(doc.name, "first");
@@ -78,20 +72,14 @@ TEST_F(RepositoryTest, FirstReadFillsTheDocumentAndCachesIt) {
     ASSERT_EQ(repository->GetConfigCacheItemInfo(kPath.c_str(), info), 0);
     EXPECT_EQ(info.timestamp, doc.timestamp());
     EXPECT_EQ(repository->GetConfigCacheItemInfo("BrimmetServer\\Other", info), -1);
-}
-
-TEST_F(RepositoryTest, PerMachineDocumentsAreLookedUpUnderTheVirtualHost) {
-    local.put("slave1", "BrimmetServer\\Mine", storedBytes("local", 3), "2010-01-01T00:00:00.000");
-    auto repository = make();
-    TestDocument doc("Mine", true);
-    ASSERT_EQ(repository->GetLatest(doc), 0);
-    EXPECT_EQ(doc.name, "local");
+    TestDocument mine("Mine", true);  // per-machine: looked up under the virtual host
+    ASSERT_EQ(repository->GetLatest(mine), 0);
+    EXPECT_EQ(mine.name, "local");
 }
 
 TEST_F(RepositoryTest, OneCheckTimeThrottlesEveryDocument) {
     local.put("master", "BrimmetServer\\Second", storedBytes("second", 2),
               "2010-01-01T00:00:00.000");
-    auto repository = make();
     TestDocument a, b("Second");
     repository->GetLatest(a);
     repository->GetLatest(b);
@@ -112,7 +100,6 @@ TEST_F(RepositoryTest, OneCheckTimeThrottlesEveryDocument) {
 }
 
 TEST_F(RepositoryTest, ForcedReadChecksAndRereadsOnlyWhenTheTimestampDiffers) {
-    auto repository = make();
     TestDocument doc;
     repository->GetLatest(doc);
     const int retrieves = local.retrieves;
@@ -126,7 +113,6 @@ TEST_F(RepositoryTest, ForcedReadChecksAndRereadsOnlyWhenTheTimestampDiffers) {
 }
 
 TEST_F(RepositoryTest, ChangeEventForcesACheckOfEveryCachedDocument) {
-    auto repository = make();
     TestDocument doc;
     repository->GetLatest(doc);
     local.put("master", kPath, storedBytes("changed", 2), "2010-01-03T00:00:00.000");
@@ -141,7 +127,6 @@ TEST_F(RepositoryTest, ChangeEventForcesACheckOfEveryCachedDocument) {
 }
 
 TEST_F(RepositoryTest, UnreadableDocumentGivesMinusOneAndKeepsDefaults) {
-    auto repository = make();
     Quorvex::Testing::LogCapture log;
     TestDocument doc("Missing");
     EXPECT_EQ(repository->GetLatest(doc), -1);
@@ -156,7 +141,6 @@ TEST_F(RepositoryTest, DocumentMissingAKeyIsAnErrorAndNotCached) {
     Vesk::Element partial("TestDoc", -1);
     partial.addMultiElement().addElement("Name", {}, -1).addSingle().assign("only");
     local.put("master", kPath, StoredForm::encode(partial), "2010-01-01T00:00:00.000");
-    auto repository = make();
     Quorvex::Testing::LogCapture log;
     TestDocument doc;
     EXPECT_EQ(repository->GetLatest(doc), -1);
@@ -170,7 +154,6 @@ TEST_F(RepositoryTest, DocumentMissingAKeyIsAnErrorAndNotCached) {
 }
 
 TEST_F(RepositoryTest, StaleCheckFailureKeepsTheCachedCopyWhole) {
-    auto repository = make();
     TestDocument doc;
     repository->GetLatest(doc);
     local.put("master", kPath, "not a stored document", "2010-01-05T00:00:00.000");
@@ -184,7 +167,6 @@ TEST_F(RepositoryTest, StaleCheckFailureKeepsTheCachedCopyWhole) {
 }
 
 TEST_F(RepositoryTest, StoreGoesToTheMasterAndIsReadBackFromTheCache) {
-    auto repository = make();
     TestDocument doc;
     doc.name = "stored";
     ASSERT_EQ(repository->Store(doc), 0);
@@ -198,7 +180,6 @@ TEST_F(RepositoryTest, StoreGoesToTheMasterAndIsReadBackFromTheCache) {
 }
 
 TEST_F(RepositoryTest, FailedStoreIsMinusOneButKeepsTheNewTimestamp) {
-    auto repository = make();
     master.down = true;
     Quorvex::Testing::LogCapture log;
     TestDocument doc;
@@ -210,7 +191,6 @@ TEST_F(RepositoryTest, FailedStoreIsMinusOneButKeepsTheNewTimestamp) {
 }
 
 TEST_F(RepositoryTest, SignalChangedReachesEveryOtherHostAndSkipsTheLocalOne) {
-    auto repository = make();
     other.down = true;  // one unreachable host does not stop the others
     local.hosts = {"slave2", "SLAVE1", "master"};
     Quorvex::Testing::LogCapture log;
@@ -225,7 +205,6 @@ TEST_F(RepositoryTest, SignalChangedReachesEveryOtherHostAndSkipsTheLocalOne) {
 }
 
 TEST_F(RepositoryTest, RefreshAndRestartGoToTheLocalServiceOnly) {
-    auto repository = make();
     repository->SignalRefresh();
     repository->SignalRestart();
     EXPECT_EQ(local.refreshes, 1);
@@ -238,13 +217,12 @@ TEST_F(RepositoryTest, RefreshAndRestartGoToTheLocalServiceOnly) {
         "service. Standard Exception: "));
 }
 
-TEST_F(RepositoryTest, CacheMasterCopiesExactlyTheMissingAndChangedItems) {
+TEST_F(RepositoryTest, CacheMasterCopiesExactlyTheMissingAndChangedItemsAndNothingOnTheMaster) {
     master.put("master", "A", "a", "2010-01-01T00:00:00.000");
     master.put("slave2", "B", "b", "2010-01-01T00:00:00.000");
     master.put("master", "C", "c-new", "2010-01-02T00:00:00.000");
     local.put("master", "C", "c-old", "2010-01-01T00:00:00.000");
     local.put("slave1", "Own", "own", "2010-01-01T00:00:00.000");
-    auto repository = make();
     const int before = local.stores;
     ASSERT_EQ(repository->CacheMasterWebToLocalWeb(), 0);
     EXPECT_EQ(local.stores, before + 3);
@@ -253,17 +231,13 @@ TEST_F(RepositoryTest, CacheMasterCopiesExactlyTheMissingAndChangedItems) {
     EXPECT_EQ(local.find("master", "C").time, "2010-01-02T00:00:00.000");  // the master's time
     ASSERT_EQ(repository->CacheMasterWebToLocalWeb(), 0);  // a second run copies nothing
     EXPECT_EQ(local.stores, before + 3);
-}
-
-TEST_F(RepositoryTest, CacheMasterOnTheMasterItselfCopiesNothing) {
-    master.put("master", "A", "a", "2010-01-01T00:00:00.000");
-    auto repository = make("SLAVE1");
+    master.put("master", "D", "d", "2010-01-01T00:00:00.000");
+    repository->SetMasterHostName("SLAVE1");  // on the master itself nothing is copied
     EXPECT_EQ(repository->CacheMasterWebToLocalWeb(), 0);
-    EXPECT_EQ(local.stores, 0);
+    EXPECT_EQ(local.stores, before + 3);
 }
 
 TEST_F(RepositoryTest, ServiceOperationsGoToTheRightHostAndReportFailures) {
-    auto repository = make();
     EXPECT_EQ(repository->RegisterService("Dicom", "tcp://x:104"), 0);
     ASSERT_EQ(master.registrations.size(), 1u);
     EXPECT_EQ(master.registrations[0], "slave1|Dicom|tcp://x:104");

@@ -1,6 +1,6 @@
 // FakeService / FakeConnector: configuration services held in memory for repository tests. Each
-// fake counts its requests and can be made unreachable. Test support only; not thread-safe
-// except where noted.
+// fake counts its requests and can be made unreachable. Test support only; a connection's calls
+// are thread-safe, setting a fake up is not.
 #pragma once
 
 #include <ace/OS_NS_strings.h>
@@ -30,10 +30,12 @@ struct FakeService {
     std::atomic<int> retrieves{0}, timestamps{0}, stores{0}, changed{0}, refreshes{0}, restarts{0};
     std::vector<std::string> registrations;
 
-    void check() {
+    // This service; throws as an unreachable one would when down.
+    FakeService& reached() {
         if (down) {
             throw std::runtime_error("service " + name + " unreachable");
         }
+        return *this;
     }
     const Item& find(const ACE_CString& host, const ACE_CString& n) const {
         const auto it = items.find({host.c_str(), n.c_str()});
@@ -51,43 +53,33 @@ struct FakeService {
 
 class FakeConnection : public ServiceConnection {
 public:
-    explicit FakeConnection(FakeService& s) : m_s(s) {
-        m_s.check();
-        m_name = s.name.c_str();
-    }
+    explicit FakeConnection(FakeService& s) : m_s(s.reached()), m_name(s.name.c_str()) {}
     const ACE_CString& hostName() const override { return m_name; }
     void retrieve(const ACE_CString& host, const ACE_CString& n, Quorvex::ByteArray& data,
                   std::size_t& length) override {
-        m_s.check();
-        std::lock_guard<std::mutex> guard(m_s.mutex);
+        std::lock_guard<std::mutex> guard(m_s.reached().mutex);
         ++m_s.retrieves;
         const std::string& b = m_s.find(host, n).bytes;
         length = b.size();
         data.reset(new unsigned char[b.size() + 1]);
         std::memcpy(data.get(), b.data(), b.size());
     }
+    // A store without a time is stamped now, as the real service does.
     void store(const ACE_CString& host, const ACE_CString& n, const unsigned char* data,
                std::size_t length, const ACE_CString& time) override {
-        m_s.check();
-        std::lock_guard<std::mutex> guard(m_s.mutex);
+        std::lock_guard<std::mutex> guard(m_s.reached().mutex);
         ++m_s.stores;
-        const std::string t = time.length() > 0 ? time.c_str() : nextTime();
         m_s.put(host.c_str(), n.c_str(), std::string(reinterpret_cast<const char*>(data), length),
-                t);
+                (time.length() > 0 ? time : BDateTime::Now().ToString()).c_str());
     }
     void getTimeStamp(const ACE_CString& host, const ACE_CString& n, BDateTime& ts) override {
-        m_s.check();
-        std::lock_guard<std::mutex> guard(m_s.mutex);
+        std::lock_guard<std::mutex> guard(m_s.reached().mutex);
         ++m_s.timestamps;
         ts = BDateTime(m_s.find(host, n).time.c_str());
     }
-    void listHosts(std::vector<ACE_CString>& hosts) override {
-        m_s.check();
-        hosts = m_s.hosts;
-    }
+    void listHosts(std::vector<ACE_CString>& hosts) override { hosts = m_s.reached().hosts; }
     void listItems(const ACE_CString& host, std::vector<_HttpConfigurationItemInfo>& out) override {
-        m_s.check();
-        std::lock_guard<std::mutex> guard(m_s.mutex);
+        std::lock_guard<std::mutex> guard(m_s.reached().mutex);
         out.clear();
         for (const auto& [key, item] : m_s.items) {
             if (host == "*" || ACE_OS::strcasecmp(key.first.c_str(), host.c_str()) == 0) {
@@ -97,36 +89,17 @@ public:
     }
     void registerService(const ACE_CString& host, const ACE_CString& service,
                          const ACE_CString& connection) override {
-        m_s.check();
-        std::lock_guard<std::mutex> guard(m_s.mutex);
+        std::lock_guard<std::mutex> guard(m_s.reached().mutex);
         m_s.registrations.push_back(std::string(host.c_str()) + "|" + service.c_str() + "|" +
                                     connection.c_str());
     }
-    void switchoverPersistent(const ACE_CString&) override { m_s.check(); }
-    void enableMergeNetworkCapture(bool, const ACE_CString&) override { m_s.check(); }
-    void signalChanged() override {
-        m_s.check();
-        ++m_s.changed;
-    }
-    void signalRestart() override {
-        m_s.check();
-        ++m_s.restarts;
-    }
-    void signalRefresh() override {
-        m_s.check();
-        ++m_s.refreshes;
-    }
+    void switchoverPersistent(const ACE_CString&) override { m_s.reached(); }
+    void enableMergeNetworkCapture(bool, const ACE_CString&) override { m_s.reached(); }
+    void signalChanged() override { ++m_s.reached().changed; }
+    void signalRestart() override { ++m_s.reached().restarts; }
+    void signalRefresh() override { ++m_s.reached().refreshes; }
 
 private:
-    // A store without a time gets a fresh, distinct one, as the real service does.
-    static std::string nextTime() {
-        static std::atomic<int> counter{0};
-        char text[40];
-        std::snprintf(text, sizeof text, "2020-01-01T00:00:%02d.%03d", (counter / 1000) % 60,
-                      counter % 1000);
-        ++counter;
-        return text;
-    }
     FakeService& m_s;
     ACE_CString m_name;
 };
@@ -135,12 +108,12 @@ private:
 class FakeConnector : public ServiceConnector {
 public:
     explicit FakeConnector(std::string localHost) : m_local(std::move(localHost)) {}
-    void add(const std::string& host, FakeService& service) { m_services[lower(host)] = &service; }
+    void add(const std::string& host, FakeService& service) { m_services[host] = &service; }
     std::unique_ptr<ServiceConnection> connectLocal() const override {
         return connect(m_local.c_str());
     }
     std::unique_ptr<ServiceConnection> connect(const ACE_CString& host) const override {
-        const auto it = m_services.find(lower(host.c_str()));
+        const auto it = m_services.find(host.c_str());
         if (it == m_services.end()) {
             throw std::runtime_error(std::string("unknown host ") + host.c_str());
         }
@@ -148,13 +121,13 @@ public:
     }
 
 private:
-    static std::string lower(std::string s) {
-        for (char& c : s)
-            c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
-        return s;
-    }
+    struct IgnoringCase {
+        bool operator()(const std::string& a, const std::string& b) const {
+            return ACE_OS::strcasecmp(a.c_str(), b.c_str()) < 0;
+        }
+    };
     std::string m_local;
-    std::map<std::string, FakeService*> m_services;
+    std::map<std::string, FakeService*, IgnoringCase> m_services;
 };
 
 }  // namespace Testing

@@ -1,7 +1,6 @@
 #include "TestCertificates.h"
 
 #include <cstdlib>
-#include <fstream>
 #include <stdexcept>
 
 namespace Quorvex {
@@ -9,7 +8,11 @@ namespace Testing {
 
 namespace {
 
-void run(const std::string& command) {
+// Makes a new EC key and a certificate valid for two days, as args say; throws
+// std::runtime_error when openssl fails.
+void newCertificate(const std::string& args) {
+    const std::string command =
+        "openssl req -x509 -newkey ec -pkeyopt ec_paramgen_curve:prime256v1 -nodes -days 2 " + args;
     if (std::system((command + " >/dev/null 2>&1").c_str()) != 0) {
         throw std::runtime_error("TestCertificates: failed: " + command);
     }
@@ -19,8 +22,6 @@ std::string quoted(const std::string& path) {
     return "'" + path + "'";
 }
 
-const char* const NEW_EC_KEY = " -newkey ec -pkeyopt ec_paramgen_curve:prime256v1 -nodes";
-
 }  // namespace
 
 TestCertificates TestCertificates::Create(const std::string& folder) {
@@ -29,22 +30,16 @@ TestCertificates TestCertificates::Create(const std::string& folder) {
     made.server.certificateFile = folder + "/server.pem";
     made.server.privateKeyFile = folder + "/server.key";
     const std::string caKey = folder + "/ca.key";
-    const std::string request = folder + "/server.csr";
-    const std::string extensions = folder + "/server.ext";
-
-    run(std::string("openssl req -x509") + NEW_EC_KEY + " -keyout " + quoted(caKey) + " -out " +
-        quoted(made.caFile) + " -days 2 -subj '/CN=Quorvex Test CA'" +
-        " -addext 'basicConstraints=critical,CA:TRUE'" +
-        " -addext 'keyUsage=critical,keyCertSign,cRLSign'");
-    run(std::string("openssl req") + NEW_EC_KEY + " -keyout " + quoted(made.server.privateKeyFile) +
-        " -out " + quoted(request) + " -subj '/CN=127.0.0.1'");
-    std::ofstream(extensions) << "subjectAltName=IP:127.0.0.1,DNS:localhost\n"
-                                 "basicConstraints=CA:FALSE\n"
-                                 "keyUsage=critical,digitalSignature,keyEncipherment\n"
-                                 "extendedKeyUsage=serverAuth\n";
-    run("openssl x509 -req -in " + quoted(request) + " -CA " + quoted(made.caFile) + " -CAkey " +
-        quoted(caKey) + " -CAcreateserial -days 2 -extfile " + quoted(extensions) + " -out " +
-        quoted(made.server.certificateFile));
+    newCertificate("-keyout " + quoted(caKey) + " -out " + quoted(made.caFile) +
+                   " -subj '/CN=Quorvex Test CA' -addext 'basicConstraints=critical,CA:TRUE'"
+                   " -addext 'keyUsage=critical,keyCertSign,cRLSign'");
+    newCertificate("-keyout " + quoted(made.server.privateKeyFile) + " -out " +
+                   quoted(made.server.certificateFile) + " -subj '/CN=127.0.0.1' -CA " +
+                   quoted(made.caFile) + " -CAkey " + quoted(caKey) +
+                   " -addext 'subjectAltName=IP:127.0.0.1,DNS:localhost'"
+                   " -addext 'basicConstraints=CA:FALSE'"
+                   " -addext 'keyUsage=critical,digitalSignature,keyEncipherment'"
+                   " -addext 'extendedKeyUsage=serverAuth'");
     return made;
 }
 

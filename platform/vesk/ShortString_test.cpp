@@ -23,7 +23,7 @@ std::string text(const ShortString& s) {
 TEST(VeskShortString, ShortStringsStayInsideLongOnesGoToTheHeap) {
     const std::string shortest(ShortString::kInline - 1, 's');
     const std::string longest(ShortString::kInline, 'l');
-    ShortString s(shortest.c_str(), shortest.size());
+    ShortString s((shortest + "beyond len").c_str(), shortest.size());
     EXPECT_TRUE(heldInside(s));
     EXPECT_EQ(shortest, text(s));
     EXPECT_EQ('\0', s.str().c_str()[shortest.size()]);
@@ -35,12 +35,6 @@ TEST(VeskShortString, ShortStringsStayInsideLongOnesGoToTheHeap) {
     EXPECT_EQ("back", text(s));
     s.clear();
     EXPECT_TRUE(s.str().empty());
-}
-
-TEST(VeskShortString, TakesExactlyLenBytes) {
-    const ShortString s("abcdef", 3);
-    EXPECT_EQ("abc", text(s));
-    EXPECT_STREQ("abc", s.str().c_str());
 }
 
 // Guards against reading the old bytes after they were overwritten or freed.
@@ -57,21 +51,17 @@ TEST(VeskShortString, AssigningFromItselfOrAPartOfItselfKeepsTheBytes) {
     EXPECT_EQ(std::string(5, 't'), text(s));
 }
 
-TEST(VeskShortString, CopiesAndMovesOwnTheirBytesAndMovesEmptyTheSource) {
+// Copies and moves through Element are covered with the element tree; these are the cases it
+// cannot reach.
+TEST(VeskShortString, CopiesOwnTheirBytesAndSelfAssignmentKeepsThem) {
     for (const std::string& value : {std::string("short"), std::string(50, 'x')}) {
         ShortString source(value.c_str());
         ShortString copy(source);
         source.assign("changed");
         EXPECT_EQ(value, text(copy));
-
-        ShortString moved(std::move(copy));
-        EXPECT_EQ(value, text(moved));
-        EXPECT_TRUE(copy.str().empty());
-
         ShortString target(std::string(60, 'o').c_str());
-        target = std::move(moved);
-        EXPECT_EQ(value, text(target));
-        EXPECT_TRUE(moved.str().empty());
+        target = std::move(copy);  // frees the target's heap bytes
+        EXPECT_TRUE(copy.str().empty());
         target = target;
         EXPECT_EQ(value, text(target));
     }

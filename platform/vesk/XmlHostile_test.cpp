@@ -27,12 +27,6 @@ std::string refusal(const std::string& text) {
     return "";
 }
 
-void expectRefused(const std::string& text, const std::string& fragment) {
-    const std::string message = refusal(text);
-    EXPECT_NE(std::string::npos, message.find(fragment))
-        << "input: " << text << "\nmessage: " << message;
-}
-
 // A valid document with one of every kind of node.
 std::string sampleDocument() {
     Element root("Root");
@@ -46,29 +40,80 @@ std::string sampleDocument() {
     return XmlUtils::toString(root);
 }
 
-// Text nested depth levels deep, as alternating e and l nodes.
-std::string nestedDocument(int depth) {
+std::string repeated(const std::string& part, int times) {
     std::string text;
-    for (int level = 1; level <= depth; ++level) {
-        text += level % 2 == 1 ? "<e k=\"x\">" : "<l>";
-    }
-    for (int level = depth; level >= 1; --level) {
-        text += level % 2 == 1 ? "</e>" : "</l>";
+    for (int i = 0; i < times; ++i) {
+        text += part;
     }
     return text;
 }
 
-TEST(XmlHostile, MalformedXmlIsRefused) {
-    for (const char* text :
-         {"", " \n ", "plain text", "<e k=\"a\">", "<e k=\"a\"></f>", "<e k=\"a\"><s>x</e></s>",
-          "<e k=a></e>", "<e k=\"a\"></e></e>", "<e k=\"a\" <s/></e>", "<<e k=\"a\"/>", "</e>"}) {
-        EXPECT_FALSE(refusal(text).empty()) << text;
-    }
-    expectRefused("<e k=\"a\"></f>", "malformed XML at byte");
+// Text nested depth levels deep, as alternating e and l nodes.
+std::string nestedDocument(int depth) {
+    const std::string inner = depth % 2 == 1 ? "<e k=\"x\"></e>" : "";
+    return repeated("<e k=\"x\"><l>", depth / 2) + inner + repeated("</l></e>", depth / 2);
 }
 
-TEST(XmlHostile, UnknownEntityReferencesStayLiteralText) {
-    EXPECT_EQ(textElement("a", "&undefined;"), parseText("<e k=\"a\"><s>&undefined;</s></e>"));
+TEST(XmlHostile, HostileInputIsRefusedWithItsReason) {
+    const std::string e = "<e k=\"a\">";
+    const struct {
+        std::string text;
+        const char* reason;
+    } cases[] = {
+        {e + "</f>", "malformed XML at byte"},
+        {"<config><e k=\"a\"/></config>", "the root element must be <e>, not <config>"},
+        {"<e k=\"a\"/><e k=\"b\"/>", "more than one root element"},
+        {"<e k=\"a\"/>trailing", "text is not allowed outside the root element"},
+        {"<e/>", "<e> takes exactly one attribute"},
+        {"<e k=\"a\" k64=\"YQ==\"/>", "<e> takes exactly one attribute"},
+        {"<e key=\"a\"/>", "<e> takes exactly one attribute"},
+        {e + "<x/></e>", "unexpected <x> inside <e>"},
+        {e + "<e k=\"b\"/></e>", "unexpected <e> inside <e>"},
+        {e + "text</e>", "text is not allowed inside <e>"},
+        {e + "<s/>text</e>", "text is not allowed inside <e>"},
+        {e + "<s>1</s><s>2</s></e>", "more than one value inside <e>"},
+        {e + "<s>1</s><a n=\"n\" v=\"v\"/></e>", "<a> after the value"},
+        {e + "<a n=\"n\"/></e>", "<a> takes exactly two attributes"},
+        {e + "<a v=\"v\" n=\"n\"/></e>", "<a> takes exactly two attributes"},
+        {e + "<a n=\"n\" v=\"v\">x</a></e>", "<a> must be empty"},
+        {e + "<s x=\"1\">v</s></e>", "<s> takes no attributes"},
+        {e + "<s>a<b/>c</s></e>", "<s> holds text only"},
+        {e + "<l><s>v</s></l></e>", "unexpected <s> inside <l>"},
+        {e + "<l>x</l></e>", "text is not allowed inside <l>"},
+        {e + "<m><e k=\"b\"/></m></e>", "unexpected <e> inside <m>"},
+        {e + "<m><a n=\"\" v=\"\"/></m></e>", "unexpected <a> inside <m>"},
+        {e + "<m>x</m></e>", "text is not allowed inside <m>"},
+        {"<e k=\"" + std::string(500, 'n') + "\"><" + std::string(500, 'x') + "/></e>",
+         "unexpected <xxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxx...> inside <e>"},
+        // Entities are never expanded: any DOCTYPE is refused before one could be defined.
+        {"<!DOCTYPE e><e k=\"a\"/>", "a DOCTYPE is not accepted"},
+        {kDeclaration + "<!DOCTYPE e [<!ENTITY x \"expanded\">]>" + e + "<s>&x;</s></e>",
+         "a DOCTYPE is not accepted"},
+        {"<!DOCTYPE e SYSTEM \"file:///etc/passwd\">" + e + "<s>&x;</s></e>",
+         "a DOCTYPE is not accepted"},
+        // Nesting is bounded without exhausting the stack.
+        {nestedDocument(XmlUtils::kMaxDepth + 1), "nests deeper than 200 levels"},
+        {nestedDocument(100000), "nests deeper than 200 levels"},
+        {e + repeated("<m>", 50000) + repeated("</m>", 50000) + "</e>",
+         "nests deeper than 200 levels"},
+        {std::string("<e k=\"a\"><s>x\0y</s></e>", 22), "NUL byte"},
+        {e + "<s>&#x100;</s></e>", "above U+00FF"},
+        {e + "<s>\xE2\x82\xAC</s></e>", "above U+00FF"},  // UTF-8 euro sign
+        {"<e k=\"\xC3\"><s/></e>", "broken UTF-8"},       // undeclared 8-bit
+        {e + "<s64>not base64!</s64></e>", "not valid Base64"},
+        {"<e k64=\"YQ\"/>", "not valid Base64"},
+    };
+    for (const std::string& text :
+         {std::string(), std::string(" \n "), std::string("plain text"), e, e + "<s>x</e></s>",
+          std::string("<e k=a></e>"), e + "</e></e>", std::string("<e k=\"a\" <s/></e>"),
+          std::string("<<e k=\"a\"/>"), std::string("</e>"), e + "<!DOCTYPE e></e>"}) {
+        EXPECT_FALSE(refusal(text).empty()) << text;
+    }
+    for (const auto& c : cases) {
+        const std::string message = refusal(c.text);
+        EXPECT_NE(std::string::npos, message.find(c.reason))
+            << "input: " << c.text.substr(0, 200) << "\nmessage: " << message;
+    }
 }
 
 TEST(XmlHostile, EveryTruncationOfAValidDocumentIsRefused) {
@@ -79,64 +124,12 @@ TEST(XmlHostile, EveryTruncationOfAValidDocumentIsRefused) {
     }
 }
 
-TEST(XmlHostile, UnknownRootOrStructureIsRefused) {
-    expectRefused("<config><e k=\"a\"/></config>", "the root element must be <e>, not <config>");
-    expectRefused("<e k=\"a\"/><e k=\"b\"/>", "more than one root element");
-    expectRefused("<e k=\"a\"/>trailing", "text is not allowed outside the root element");
-    expectRefused("<e k=\"a\"/>x", "text is not allowed outside the root element");
-    expectRefused("<e/>", "<e> takes exactly one attribute");
-    expectRefused("<e k=\"a\" k64=\"YQ==\"/>", "<e> takes exactly one attribute");
-    expectRefused("<e key=\"a\"/>", "<e> takes exactly one attribute");
-    expectRefused("<e k=\"a\"><x/></e>", "unexpected <x> inside <e>");
-    expectRefused("<e k=\"a\"><e k=\"b\"/></e>", "unexpected <e> inside <e>");
-    expectRefused("<e k=\"a\">text</e>", "text is not allowed inside <e>");
-    expectRefused("<e k=\"a\"><s/>text</e>", "text is not allowed inside <e>");
-    expectRefused("<e k=\"a\"><s>1</s><s>2</s></e>", "more than one value inside <e>");
-    expectRefused("<e k=\"a\"><s>1</s><a n=\"n\" v=\"v\"/></e>", "<a> after the value");
-    expectRefused("<e k=\"a\"><a n=\"n\"/></e>", "<a> takes exactly two attributes");
-    expectRefused("<e k=\"a\"><a v=\"v\" n=\"n\"/></e>", "<a> takes exactly two attributes");
-    expectRefused("<e k=\"a\"><a n=\"n\" v=\"v\">x</a></e>", "<a> must be empty");
-    expectRefused("<e k=\"a\"><s x=\"1\">v</s></e>", "<s> takes no attributes");
-    expectRefused("<e k=\"a\"><s>a<b/>c</s></e>", "<s> holds text only");
-    expectRefused("<e k=\"a\"><l><s>v</s></l></e>", "unexpected <s> inside <l>");
-    expectRefused("<e k=\"a\"><l>x</l></e>", "text is not allowed inside <l>");
-    expectRefused("<e k=\"a\"><m><e k=\"b\"/></m></e>", "unexpected <e> inside <m>");
-    expectRefused("<e k=\"a\"><m><a n=\"\" v=\"\"/></m></e>", "unexpected <a> inside <m>");
-    expectRefused("<e k=\"a\"><m>x</m></e>", "text is not allowed inside <m>");
-    expectRefused("<e k=\"" + std::string(500, 'n') + "\"><" + std::string(500, 'x') + "/></e>",
-                  "unexpected <xxxxxxxxxxxxxxxxxxxxxxxxxxxxxxxx...> inside <e>");
-}
-
-TEST(XmlHostile, DoctypesAreRefusedAndEntitiesNeverExpanded) {
-    expectRefused("<!DOCTYPE e><e k=\"a\"/>", "a DOCTYPE is not accepted");
-    expectRefused(kDeclaration + "<!DOCTYPE e [<!ENTITY x \"expanded\">]><e k=\"a\"><s>&x;</s></e>",
-                  "a DOCTYPE is not accepted");
-    std::string laughs = "<!DOCTYPE e [<!ENTITY l0 \"lol\">";
-    for (int i = 1; i < 10; ++i) {
-        std::string body;
-        for (int j = 0; j < 10; ++j) {
-            body += "&l" + std::to_string(i - 1) + ";";
-        }
-        laughs += "<!ENTITY l" + std::to_string(i) + " \"" + body + "\">";
-    }
-    expectRefused(laughs + "]><e k=\"a\"><s>&l9;</s></e>", "a DOCTYPE is not accepted");
-    expectRefused("<!DOCTYPE e SYSTEM \"file:///etc/passwd\"><e k=\"a\"><s>&x;</s></e>",
-                  "a DOCTYPE is not accepted");
-    EXPECT_FALSE(refusal("<e k=\"a\"><!DOCTYPE e></e>").empty());
-}
-
-TEST(XmlHostile, NestingBeyondTheLimitIsRefusedWithoutExhaustingTheStack) {
+TEST(XmlHostile, NearMissesAreRead) {
     EXPECT_NO_THROW(parseText(nestedDocument(XmlUtils::kMaxDepth)));
-    expectRefused(nestedDocument(XmlUtils::kMaxDepth + 1), "nests deeper than 200 levels");
-    expectRefused(nestedDocument(100000), "nests deeper than 200 levels");
-    std::string multis = "<e k=\"a\">";
-    for (int i = 0; i < 50000; ++i) {
-        multis += "<m>";
-    }
-    for (int i = 0; i < 50000; ++i) {
-        multis += "</m>";
-    }
-    expectRefused(multis + "</e>", "nests deeper than 200 levels");
+    EXPECT_EQ(textElement("a", "&undefined;"), parseText("<e k=\"a\"><s>&undefined;</s></e>"));
+    // Declared ISO-8859-1, bytes that are broken UTF-8 are characters of their own.
+    EXPECT_EQ(textElement("\xC3", "\xE2\x82\xAC"),
+              parseText(kDeclaration + "<e k=\"\xC3\"><s>\xE2\x82\xAC</s></e>"));
 }
 
 TEST(XmlHostile, TextsLargerThanTheLimitAreRefusedBeforeReading) {
@@ -153,41 +146,18 @@ TEST(XmlHostile, TextsLargerThanTheLimitAreRefusedBeforeReading) {
     }
 }
 
-TEST(XmlHostile, BytesAndCharactersOutsideTheModelAreRefused) {
-    expectRefused(std::string("<e k=\"a\"><s>x\0y</s></e>", 22), "NUL byte");
-    expectRefused("<e k=\"a\"><s>&#x100;</s></e>", "above U+00FF");
-    expectRefused("<e k=\"a\"><s>\xE2\x82\xAC</s></e>", "above U+00FF");  // UTF-8 euro sign
-    expectRefused("<e k=\"\xC3\"><s/></e>", "broken UTF-8");              // undeclared 8-bit
-    expectRefused("<e k=\"a\"><s64>not base64!</s64></e>", "not valid Base64");
-    expectRefused("<e k64=\"YQ\"/>", "not valid Base64");
-    // Declared ISO-8859-1, the same bytes are characters of their own.
-    EXPECT_EQ(textElement("\xC3", "\xE2\x82\xAC"),
-              parseText(kDeclaration + "<e k=\"\xC3\"><s>\xE2\x82\xAC</s></e>"));
-}
-
 TEST(XmlHostile, RandomCorruptionsEitherReadConsistentlyOrAreRefused) {
     const std::string valid = sampleDocument();
     const std::string alphabet = "<>/=\"'&;#x e k s64mla!-[]\x01\xE9\xFF";
     std::mt19937 random(20240611u);
     for (int round = 0; round < 2000; ++round) {
         std::string text = valid;
-        const int edits = 1 + static_cast<int>(random() % 4);
-        for (int i = 0; i < edits; ++i) {
-            const std::size_t at = random() % text.size();
-            switch (random() % 3) {
-                case 0:
-                    text[at] = alphabet[random() % alphabet.size()];
-                    break;
-                case 1:
-                    text.erase(at, 1 + random() % 8);
-                    break;
-                default:
-                    text.insert(at, 1, alphabet[random() % alphabet.size()]);
-                    break;
-            }
-            if (text.empty()) {
-                text = "<";
-            }
+        for (unsigned edits = 1 + random() % 4; edits > 0; --edits) {
+            // Replaces 0..3 bytes by 0..2 bytes: an insertion, deletion or change.
+            const std::size_t at = random() % (text.size() + 1);
+            const std::size_t removed = random() % 4;
+            const std::size_t added = random() % 3;
+            text.replace(at, removed, std::string(added, alphabet[random() % alphabet.size()]));
         }
         try {
             const Element tree = parseText(text);
