@@ -7,20 +7,12 @@
 #include <set>
 
 #include "Answer.h"
+#include "Quorvex/Host.h"
 #include "Quorvex/Log.h"
 #include "ServerInfo.h"
 
 namespace ConfigurationService {
 namespace {
-
-std::string lower(std::string text) {
-    for (char& c : text) {
-        if (c >= 'A' && c <= 'Z') {
-            c = static_cast<char>(c - 'A' + 'a');
-        }
-    }
-    return text;
-}
 
 bool parseInt(const std::string& text, int& value) {
     if (text.empty()) {
@@ -106,7 +98,7 @@ Reply SiteOperations::hostList(const std::string& operation, Filter filter) {
     Answer answer = Answer::success(operation);
     std::set<std::string> seen;
     for (const Configuration::ServiceRegistration& r : m_context.store.services()) {
-        if (filter(r) && seen.insert(lower(r.host.c_str())).second) {
+        if (filter(r) && seen.insert(Quorvex::HostKey(r.host.c_str())).second) {
             answer.element("HostName", r.host.c_str());
         }
     }
@@ -201,7 +193,8 @@ Reply SiteOperations::enableMergeNetworkCapture(const Request& request) {
     if (host.empty()) {
         throw OperationFailed("Host names no host");
     }
-    m_context.store.setSetting((kCaptureSettingPrefix + lower(host)).c_str(), enable.c_str());
+    m_context.store.setSetting((kCaptureSettingPrefix + Quorvex::HostKey(host)).c_str(),
+                               enable.c_str());
     return done("EnableMergeNetworkCapture");
 }
 

@@ -1,11 +1,12 @@
 // The embedded directory store: items in memory, each mirrored durably by one file.
 #include "repository/DirectoryStore.h"
 
-#include <chrono>
 #include <cstring>
 #include <stdexcept>
 
+#include "Quorvex/Host.h"
 #include "Quorvex/Log.h"
+#include "Quorvex/Machine.h"
 #include "repository/ItemFile.h"
 #include "repository/StoreFileName.h"
 
@@ -42,23 +43,8 @@ void validate(const ACE_CString& host, const ACE_CString& name) {
     }
 }
 
-std::string lowerHost(const std::string& host) {
-    std::string lower = host;
-    for (char& c : lower) {
-        if (c >= 'A' && c <= 'Z') {
-            c = static_cast<char>(c - 'A' + 'a');
-        }
-    }
-    return lower;
-}
-
 std::string makeKey(const std::string& lowerCaseHost, const std::string& name) {
     return lowerCaseHost + std::string(1, '\0') + name;
-}
-
-std::int64_t nowMilliseconds() {
-    using namespace std::chrono;
-    return duration_cast<milliseconds>(system_clock::now().time_since_epoch()).count();
 }
 
 }  // namespace
@@ -87,7 +73,7 @@ void DirectoryStore::loadItem(const std::string& fileName) {
                     fileName.c_str());
         return;
     }
-    const std::string lower = lowerHost(parsed.host);
+    const std::string lower = Quorvex::HostKey(parsed.host);
     if (StoreFileName::item(lower, parsed.name) != fileName) {
         QUORVEX_LOG(LM_ERROR, "DirectoryStore: %s holds an item of another name; ignored\n",
                     fileName.c_str());
@@ -114,7 +100,7 @@ void DirectoryStore::loadRegistry() {
 }
 
 std::int64_t DirectoryStore::nextTime() {
-    const std::int64_t now = nowMilliseconds();
+    const std::int64_t now = Quorvex::CurrentMachine().nowMilliseconds();
     std::int64_t last = m_lastIssuedMs.load();
     std::int64_t next;
     do {
@@ -129,7 +115,7 @@ std::int64_t DirectoryStore::store(const ACE_CString& host, const ACE_CString& n
     validate(host, name);
     const std::string hostText = toStd(host);
     const std::string nameText = toStd(name);
-    const std::string lower = lowerHost(hostText);
+    const std::string lower = Quorvex::HostKey(hostText);
     Entry entry;
     entry.fileName = StoreFileName::item(lower, nameText);
     entry.item.host = host;
@@ -168,7 +154,7 @@ void DirectoryStore::commitItem(const std::string& key, Entry entry,
 
 bool DirectoryStore::retrieve(const ACE_CString& host, const ACE_CString& name,
                               StoredItem& item) const {
-    const std::string key = makeKey(lowerHost(toStd(host)), toStd(name));
+    const std::string key = makeKey(Quorvex::HostKey(toStd(host)), toStd(name));
     std::shared_lock<std::shared_mutex> lock(m_itemsMutex);
     auto it = m_items.find(key);
     if (it == m_items.end()) {
@@ -179,13 +165,13 @@ bool DirectoryStore::retrieve(const ACE_CString& host, const ACE_CString& name,
 }
 
 bool DirectoryStore::exists(const ACE_CString& host, const ACE_CString& name) const {
-    const std::string key = makeKey(lowerHost(toStd(host)), toStd(name));
+    const std::string key = makeKey(Quorvex::HostKey(toStd(host)), toStd(name));
     std::shared_lock<std::shared_mutex> lock(m_itemsMutex);
     return m_items.count(key) != 0;
 }
 
 bool DirectoryStore::remove(const ACE_CString& host, const ACE_CString& name) {
-    const std::string key = makeKey(lowerHost(toStd(host)), toStd(name));
+    const std::string key = makeKey(Quorvex::HostKey(toStd(host)), toStd(name));
     std::uint64_t ticket = 0;
     {
         std::unique_lock<std::shared_mutex> lock(m_itemsMutex);
@@ -210,7 +196,7 @@ std::vector<StoredItem> DirectoryStore::list(const ACE_CString& host) const {
         }
         return items;
     }
-    const std::string prefix = lowerHost(toStd(host)) + std::string(1, '\0');
+    const std::string prefix = Quorvex::HostKey(toStd(host)) + std::string(1, '\0');
     for (auto it = m_items.lower_bound(prefix);
          it != m_items.end() && it->first.compare(0, prefix.size(), prefix) == 0; ++it) {
         items.push_back(it->second.item);

@@ -1,6 +1,5 @@
 #include "Configuration/ServiceLocation.h"
 
-#include <cctype>
 #include <cstdlib>
 #include <sstream>
 
@@ -8,13 +7,6 @@
 
 namespace Configuration {
 namespace {
-
-std::string lower(std::string text) {
-    for (char& c : text) {
-        c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
-    }
-    return text;
-}
 
 bool env(const char* name, std::string& value) {
     ACE_CString text;
@@ -32,7 +24,7 @@ void parseServers(const std::string& text, std::map<std::string, std::string>& s
     while (std::getline(in, entry, ',')) {
         const std::string::size_type eq = entry.find('=');
         if (eq != std::string::npos && eq > 0) {
-            servers[lower(entry.substr(0, eq))] = entry.substr(eq + 1);
+            servers[Quorvex::HostKey(entry.substr(0, eq))] = entry.substr(eq + 1);
         }
     }
 }
@@ -63,7 +55,7 @@ ServiceLocation ServiceLocation::fromEnvironment() {
 }
 
 ACE_CString ServiceLocation::serverFor(const ACE_CString& host) const {
-    const auto it = servers.find(lower(host.c_str()));
+    const auto it = servers.find(Quorvex::HostKey(host.c_str()));
     if (it != servers.end()) {
         return it->second.c_str();
     }

@@ -1,6 +1,5 @@
 #include "repository/StoreServiceConnection.h"
 
-#include <cctype>
 #include <cstring>
 #include <stdexcept>
 #include <string>
@@ -83,10 +82,7 @@ void StoreServiceConnection::switchoverPersistent(const ACE_CString& persistentN
 }
 
 void StoreServiceConnection::enableMergeNetworkCapture(bool enable, const ACE_CString& host) {
-    std::string key = "MergeNetworkCapture:";
-    for (const char* c = host.c_str(); *c != '\0'; ++c) {
-        key.push_back(static_cast<char>(std::tolower(static_cast<unsigned char>(*c))));
-    }
+    const std::string key = "MergeNetworkCapture:" + Quorvex::HostKey(host.c_str());
     m_store->setSetting(key.c_str(), enable ? "1" : "0");
 }
 

@@ -3,6 +3,7 @@
 
 #include <ace/SString.h>
 
+#include <string>
 #include <vector>
 
 namespace Quorvex {
@@ -16,6 +17,9 @@ int GetLocalIPAddress(ACE_CString& address);
 // names differ ("a.x", "a.y"); a dotted IPv4 address has no short form; an empty name matches
 // nothing.
 bool HostNamesEquivalent(const ACE_CString& a, const ACE_CString& b);
+// The form under which a host name is keyed and compared without regard to case: ASCII letters
+// lower-cased, every other byte kept (independent of the locale, so stored keys never change).
+std::string HostKey(const std::string& host);
 // The machine's logical drives ("C:\", ...); empty on Linux.
 std::vector<ACE_CString> GetLogicalDriveList();
 // The full path of the running executable.

@@ -56,4 +56,14 @@ bool HostNamesEquivalent(const ACE_CString& a, const ACE_CString& b) {
                             shortName.length());
 }
 
+std::string HostKey(const std::string& host) {
+    std::string key = host;
+    for (char& c : key) {
+        if (c >= 'A' && c <= 'Z') {
+            c = static_cast<char>(c - 'A' + 'a');
+        }
+    }
+    return key;
+}
+
 }  // namespace Quorvex
