@@ -1,26 +1,24 @@
 // The read/write convention shared by every configuration class.
 //
-// A class lists its fields once, in its declared order, in a private static template
-//     template <class Self, class Io> static void fields(Self& self, Io& io)
+// A class lists its fields once, in its declared (written) order, in the private static template
+// that CONFIGURATION_CLASS declares:
+//     template <class Self, class Io> void AnonParam::fields(Self& self, Io& io)
 //     { io("Tag", self.m_tag); io("Value", self.m_value); ... }
-// and befriends Fields::Access. Its readVesk, writeVesk and operator== are then one line each:
-//     return Fields::read(*this, element, "AnonParam", Fields::FailureForm::Failed);
-//     return Fields::write(*this, "AnonParam");
-//     return Fields::equal(a, b);
-// Reading calls every field's reader (a missing key never stops the ones after it) and returns
-// true only when every key was present; it never throws: a failure is logged at LM_ERROR in the
-// class's message form and the fields keep what they had. Writing builds a new tree in the same
-// order; an element-tree failure becomes Vesk::Serializable::SerializableEx.
+// and its .cpp says CONFIGURATION_DEFINE(AnonParam, "AnonParam", Fields::FailureForm::Failed)
+// (ClassDefinition.h). Each line of the field list is read, written and compared from the same
+// place; the forms a line can take are in FieldForms.h.
+//
+// Reading calls every field's reader (a missing key never stops the ones after it), then the
+// class's afterRead() hook if it has one, and returns true only when every key was present; it
+// never throws: a failure is logged at LM_ERROR in the class's message form and the fields keep
+// what they had. Writing builds a new tree in the same order; an element-tree failure becomes
+// Vesk::Serializable::SerializableEx.
 #pragma once
 
 #include <exception>
 #include <vector>
 
-#include "FieldReaders.h"
-#include "FieldWriters.h"
-#include "Quorvex/auto_ptr.h"
-#include "Vesk/Element.h"
-#include "Vesk/Serializable.h"
+#include "FieldForms.h"
 
 namespace Configuration {
 namespace Fields {
@@ -35,51 +33,57 @@ enum class FailureForm {
 // Logs a caught read failure of className in the given form.
 void logReadFailure(const char* className, FailureForm form, const char* what);
 
-// Reaches a class's private field list.
-struct Access {
-    template <class T, class Io>
-    static void visit(T& object, Io& io) {
-        std::remove_const_t<T>::fields(object, io);
-    }
+// What writeVesk of a read-only class throws: a std::exception with a fixed text.
+class WriteRefused : public std::exception {
+public:
+    explicit WriteRefused(const char* text) : m_text(text) {}
+    const char* what() const noexcept override { return m_text; }
+
+private:
+    const char* m_text;
 };
 
 // Visits fields for reading: ANDs every reader's result, without short-circuit.
 class Reader {
 public:
-    explicit Reader(const Vesk::MultiElementValue& children) : m_children(children) {}
-    template <class T>
-    void operator()(const char* key, T& field) {
-        m_complete = readField(m_children, key, field) && m_complete;
+    explicit Reader(const In& in) : m_in(in) {}
+    template <class X>
+    void operator()(const char* key, X&& x) {
+        m_complete = formOf(x).read(m_in, key) && m_complete;
     }
     bool complete() const { return m_complete; }
 
 private:
-    const Vesk::MultiElementValue& m_children;
+    In m_in;
     bool m_complete = true;
 };
 
-// Visits fields for writing: appends one child per field, in order.
+// Visits fields for writing: appends one child (or attribute) per field, in order.
 class Writer {
 public:
-    explicit Writer(Vesk::MultiElementValue& out) : m_out(out) {}
-    template <class T>
-    void operator()(const char* key, const T& field) {
-        writeField(m_out, key, field);
+    explicit Writer(Out& out) : m_out(out) {}
+    template <class X>
+    void operator()(const char* key, const X& x) {
+        formOf(x).write(m_out, key);
     }
 
 private:
-    Vesk::MultiElementValue& m_out;
+    Out& m_out;
 };
 
-// Visits fields for comparison: records where each field is and how to compare it.
+// Visits fields for comparison: records where each compared value is and how to compare it.
 class Collector {
 public:
     struct Ref {
         const void* field;
         bool (*equal)(const void*, const void*);
     };
+    template <class X>
+    void operator()(const char*, const X& x) {
+        formOf(x).compare(*this);
+    }
     template <class T>
-    void operator()(const char*, const T& field) {
+    void add(const T& field) {
         m_refs.push_back(Ref{&field, &equalAs<T>});
     }
     const std::vector<Ref>& refs() const { return m_refs; }
@@ -92,13 +96,25 @@ private:
     std::vector<Ref> m_refs;
 };
 
+template <class T>
+bool readRecord(const In& in, T& record) {
+    Reader reader(in);
+    Access::visit(record, reader);
+    const bool hooked = Access::afterRead(record, 0);
+    return hooked && reader.complete();
+}
+
+template <class T>
+void writeRecord(Out& out, const T& record) {
+    Writer writer(out);
+    Access::visit(record, writer);
+}
+
 // readVesk of a class: see the file comment.
 template <class T>
 bool read(T& object, const Vesk::Element& element, const char* className, FailureForm form) {
     try {
-        Reader reader(element.getMultiElement());
-        Access::visit(object, reader);
-        return reader.complete();
+        return readRecord(In{&element, element.getMultiElement()}, object);
     } catch (const std::exception& e) {
         logReadFailure(className, form, e.what());
         return false;
@@ -110,15 +126,15 @@ template <class T>
 Quorvex::auto_ptr<Vesk::Element> write(const T& object, const char* elementName) {
     Quorvex::auto_ptr<Vesk::Element> root(new Vesk::Element(keyOf(elementName), -1));
     try {
-        Writer writer(root->addMultiElement());
-        Access::visit(object, writer);
+        Out out{root.get(), root->addMultiElement()};
+        writeRecord(out, object);
     } catch (const Vesk::TrelException&) {
         throw Vesk::Serializable::SerializableEx();
     }
     return root;
 }
 
-// operator== of a class: every field equal, in order.
+// operator== of a class: every compared field equal, in order.
 template <class T>
 bool equal(const T& a, const T& b) {
     Collector left;

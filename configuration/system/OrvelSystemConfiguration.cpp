@@ -1,12 +1,11 @@
 #include "Configuration/OrvelSystemConfiguration.h"
 
 #include "Configuration/DocumentNames.h"
-#include "model/Fields.h"
+#include "model/ClassDefinition.h"
 
 namespace Configuration {
 namespace {
 
-const char kElement[] = "OrvelSystem";
 // Longest study-date protection, in hours (15 days).
 constexpr unsigned int kMaxStudyDateTimeDataProtectionHours = 360;
 // Workstation protection must stay below a year.
@@ -36,23 +35,11 @@ void OrvelSystemConfiguration::fields(Self& self, Io& io) {
     io("AllowEmptyPatientFirstName", self.m_allowEmptyPatientFirstName);
 }
 
+CONFIGURATION_DEFINE(OrvelSystemConfiguration, "OrvelSystem", Fields::FailureForm::PartialDefaults)
+
 OrvelSystemConfiguration::OrvelSystemConfiguration()
     : TypedConfigDoc(ConfigDoc::getConfigurationRegistryPath() + DocumentNames::kOrvelSystem,
                      true) {}
-
-OrvelSystemConfiguration::OrvelSystemConfiguration(const OrvelSystemConfiguration& other) = default;
-OrvelSystemConfiguration& OrvelSystemConfiguration::operator=(
-    const OrvelSystemConfiguration& other) = default;
-OrvelSystemConfiguration::~OrvelSystemConfiguration() = default;
-
-bool OrvelSystemConfiguration::readVesk(const Vesk::Element& element) {
-    return Fields::read(*this, element, "OrvelSystemConfiguration",
-                        Fields::FailureForm::PartialDefaults);
-}
-
-Quorvex::auto_ptr<Vesk::Element> OrvelSystemConfiguration::writeVesk() const {
-    return Fields::write(*this, kElement);
-}
 
 void OrvelSystemConfiguration::setWorkstationDataProtectionDays(unsigned int days) {
     const unsigned int minimum = m_workstationAutoDeleteEnabled ? 1 : 0;
@@ -63,10 +50,6 @@ void OrvelSystemConfiguration::setWorkstationDataProtectionDays(unsigned int day
 void OrvelSystemConfiguration::setStudyDateTimeDataProtectionHours(unsigned int hours) {
     const bool valid = hours >= 1 && hours <= kMaxStudyDateTimeDataProtectionHours;
     m_studyDateTimeDataProtectionHours = valid ? hours : kDefaultStudyDateTimeDataProtectionHours;
-}
-
-bool operator==(const OrvelSystemConfiguration& a, const OrvelSystemConfiguration& b) {
-    return Fields::equal(a, b);
 }
 
 }  // namespace Configuration

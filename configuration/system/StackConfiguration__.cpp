@@ -4,12 +4,11 @@
 
 #include "Quorvex/Host.h"
 #include "Quorvex/Paths.h"
-#include "model/Fields.h"
+#include "model/ClassDefinition.h"
 
 namespace Configuration {
 namespace {
 
-const char kElement[] = "Stack";
 const char kInputFolder[] = "Quorvex\\input\\";
 const char kStackFolder[] = "Quorvex\\stack\\";
 const char kMountPointFolder[] = "Quorvex\\MultiStack\\";
@@ -62,28 +61,13 @@ void StackConfiguration__::fields(Self& self, Io& io) {
     io("VolDiscoveryMode", self.m_volDiscoveryMode);
 }
 
+CONFIGURATION_DEFINE(StackConfiguration__, "Stack", Fields::FailureForm::PartialDefaults)
+
 StackConfiguration__::StackConfiguration__() {
     const std::vector<ACE_CString> drives = Quorvex::GetLogicalDriveList();
     m_dicomInputDirectory = defaultInputDirectory(drives);
     m_configBackupDirectoryName = defaultConfigBackupDirectory(drives);
     m_mountPointRootDirectory = defaultMountPointRoot();
-}
-
-StackConfiguration__::StackConfiguration__(const StackConfiguration__& other) = default;
-StackConfiguration__& StackConfiguration__::operator=(const StackConfiguration__& other) = default;
-StackConfiguration__::~StackConfiguration__() = default;
-
-bool StackConfiguration__::readVesk(const Vesk::Element& element) {
-    return Fields::read(*this, element, "StackConfiguration__",
-                        Fields::FailureForm::PartialDefaults);
-}
-
-Quorvex::auto_ptr<Vesk::Element> StackConfiguration__::writeVesk() const {
-    return Fields::write(*this, kElement);
-}
-
-bool operator==(const StackConfiguration__& a, const StackConfiguration__& b) {
-    return Fields::equal(a, b);
 }
 
 }  // namespace Configuration

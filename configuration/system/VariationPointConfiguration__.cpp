@@ -1,12 +1,11 @@
 #include "Configuration/VariationPointConfiguration__.h"
 
 #include "Quorvex/Log.h"
-#include "model/Fields.h"
+#include "model/ClassDefinition.h"
 
 namespace Configuration {
 namespace {
 
-const char kElement[] = "VariationPoint";
 // The storage service lists selected by 0 and 1.
 const char kAllStorageServices[] = "All_Storage_Services_List";
 const char kNoStorageCommitmentPush[] = "All_Storage_Services_List_NO_STORAGE_COMMITMENT_PUSH";
@@ -19,21 +18,8 @@ void VariationPointConfiguration__::fields(Self& self, Io& io) {
     io("StorageCommitServiceList", self.m_storageCommitServiceList);
 }
 
-VariationPointConfiguration__::VariationPointConfiguration__() = default;
-VariationPointConfiguration__::VariationPointConfiguration__(
-    const VariationPointConfiguration__& other) = default;
-VariationPointConfiguration__& VariationPointConfiguration__::operator=(
-    const VariationPointConfiguration__& other) = default;
-VariationPointConfiguration__::~VariationPointConfiguration__() = default;
-
-bool VariationPointConfiguration__::readVesk(const Vesk::Element& element) {
-    return Fields::read(*this, element, "VariationPointConfiguration__",
-                        Fields::FailureForm::PartialDefaults);
-}
-
-Quorvex::auto_ptr<Vesk::Element> VariationPointConfiguration__::writeVesk() const {
-    return Fields::write(*this, kElement);
-}
+CONFIGURATION_DEFINE(VariationPointConfiguration__, "VariationPoint",
+                     Fields::FailureForm::PartialDefaults)
 
 ACE_CString VariationPointConfiguration__::getStorageCommitServiceListValue() const {
     switch (m_storageCommitServiceList) {
@@ -51,10 +37,6 @@ ACE_CString VariationPointConfiguration__::getStorageCommitServiceListValue() co
 
 bool VariationPointConfiguration__::isStorageCommitServiceListValueCustom(const ACE_CString& text) {
     return text != kAllStorageServices && text != kNoStorageCommitmentPush;
-}
-
-bool operator==(const VariationPointConfiguration__& a, const VariationPointConfiguration__& b) {
-    return Fields::equal(a, b);
 }
 
 }  // namespace Configuration

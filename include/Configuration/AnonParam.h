@@ -6,24 +6,14 @@
 
 #include <ace/SString.h>
 
-#include "Configuration/Export.h"
-#include "Configuration/FieldAccess.h"
-#include "Vesk/Serializable.h"
+#include "Configuration/ConfigurationClass.h"
 
 namespace Configuration {
 
 class CONFIGURATION_API AnonParam : public virtual Vesk::Serializable {
+    CONFIGURATION_CLASS(AnonParam);
+
 public:
-    AnonParam();
-    AnonParam(const AnonParam& other);
-    AnonParam& operator=(const AnonParam& other);
-    ~AnonParam() override;
-
-    // Fills the object from an "AnonParam" element; true when every key was present.
-    bool readVesk(const Vesk::Element& element) override;
-    // A new "AnonParam" element with the three keys in order.
-    Quorvex::auto_ptr<Vesk::Element> writeVesk() const override;
-
     const ACE_CString& getTag() const { return m_tag; }
     void setTag(const ACE_CString& tag) { m_tag = tag; }
     const ACE_CString& getValue() const { return m_value; }
@@ -32,18 +22,9 @@ public:
     void setDescription(const ACE_CString& description) { m_description = description; }
 
 private:
-    friend struct Fields::Access;
-    template <class Self, class Io>
-    static void fields(Self& self, Io& io);
-
     ACE_CString m_tag;
     ACE_CString m_value;
     ACE_CString m_description;
 };
-
-CONFIGURATION_API bool operator==(const AnonParam& a, const AnonParam& b);
-inline bool operator!=(const AnonParam& a, const AnonParam& b) {
-    return !(a == b);
-}
 
 }  // namespace Configuration

@@ -22,8 +22,7 @@
 
 #include <vector>
 
-#include "Configuration/Export.h"
-#include "Configuration/FieldAccess.h"
+#include "Configuration/ConfigurationClass.h"
 #include "Configuration/RestartConfiguration__.h"
 #include "Configuration/StackConfiguration__.h"
 #include "Configuration/TypedConfigDoc.h"
@@ -32,17 +31,11 @@
 namespace Configuration {
 
 class CONFIGURATION_API OrvelSystemConfiguration : public TypedConfigDoc<OrvelSystemConfiguration> {
+    CONFIGURATION_CLASS(OrvelSystemConfiguration);
+
 public:
     // The per-machine document "OrvelSystem" with every key at its default.
     OrvelSystemConfiguration();
-    OrvelSystemConfiguration(const OrvelSystemConfiguration& other);
-    OrvelSystemConfiguration& operator=(const OrvelSystemConfiguration& other);
-    ~OrvelSystemConfiguration() override;
-
-    // Fills the object from an "OrvelSystem" element; true when every key was present.
-    bool readVesk(const Vesk::Element& element) override;
-    // A new "OrvelSystem" element with every key in order.
-    Quorvex::auto_ptr<Vesk::Element> writeVesk() const override;
 
     // Free-space watermark of the storage volumes.
     unsigned int getFreespaceWatermark() const { return m_freespaceWatermark; }
@@ -123,10 +116,6 @@ public:
     void setAllowEmptyPatientFirstName(bool value) { m_allowEmptyPatientFirstName = value; }
 
 private:
-    friend struct Fields::Access;
-    template <class Self, class Io>
-    static void fields(Self& self, Io& io);
-
     static constexpr unsigned int kDefaultWorkstationDataProtectionDays = 8;
     static constexpr unsigned int kDefaultStudyDateTimeDataProtectionHours = 24;
 
@@ -149,11 +138,5 @@ private:
     int m_consolidationWorkItemDefinition = 0;
     bool m_allowEmptyPatientFirstName = false;
 };
-
-CONFIGURATION_API bool operator==(const OrvelSystemConfiguration& a,
-                                  const OrvelSystemConfiguration& b);
-inline bool operator!=(const OrvelSystemConfiguration& a, const OrvelSystemConfiguration& b) {
-    return !(a == b);
-}
 
 }  // namespace Configuration

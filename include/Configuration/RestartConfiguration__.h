@@ -10,24 +10,14 @@
 
 #include <ace/SString.h>
 
-#include "Configuration/Export.h"
-#include "Configuration/FieldAccess.h"
-#include "Vesk/Serializable.h"
+#include "Configuration/ConfigurationClass.h"
 
 namespace Configuration {
 
 class CONFIGURATION_API RestartConfiguration__ : public virtual Vesk::Serializable {
+    CONFIGURATION_CLASS(RestartConfiguration__);
+
 public:
-    RestartConfiguration__();
-    RestartConfiguration__(const RestartConfiguration__& other);
-    RestartConfiguration__& operator=(const RestartConfiguration__& other);
-    ~RestartConfiguration__() override;
-
-    // Fills the object from a "Restart" element; true when every key was present.
-    bool readVesk(const Vesk::Element& element) override;
-    // A new "Restart" element with both keys in order.
-    Quorvex::auto_ptr<Vesk::Element> writeVesk() const override;
-
     // Time of day of the restart, "HH:MM".
     const ACE_CString& getRestartTimeOfDay() const { return m_restartTimeOfDay; }
     void setRestartTimeOfDay(const ACE_CString& value) { m_restartTimeOfDay = value; }
@@ -36,17 +26,8 @@ public:
     void setRestartNumberOfDaysBetween(unsigned int value) { m_restartNumberOfDaysBetween = value; }
 
 private:
-    friend struct Fields::Access;
-    template <class Self, class Io>
-    static void fields(Self& self, Io& io);
-
     ACE_CString m_restartTimeOfDay{"02:00"};
     unsigned int m_restartNumberOfDaysBetween = 0;
 };
-
-CONFIGURATION_API bool operator==(const RestartConfiguration__& a, const RestartConfiguration__& b);
-inline bool operator!=(const RestartConfiguration__& a, const RestartConfiguration__& b) {
-    return !(a == b);
-}
 
 }  // namespace Configuration

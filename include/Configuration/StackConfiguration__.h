@@ -17,24 +17,16 @@
 
 #include <ace/SString.h>
 
-#include "Configuration/Export.h"
-#include "Configuration/FieldAccess.h"
-#include "Vesk/Serializable.h"
+#include "Configuration/ConfigurationClass.h"
 
 namespace Configuration {
 
 class CONFIGURATION_API StackConfiguration__ : public virtual Vesk::Serializable {
+    CONFIGURATION_CLASS(StackConfiguration__);
+
 public:
     // Every key at its default; the directories come from this machine's drives.
     StackConfiguration__();
-    StackConfiguration__(const StackConfiguration__& other);
-    StackConfiguration__& operator=(const StackConfiguration__& other);
-    ~StackConfiguration__() override;
-
-    // Fills the object from a "Stack" element; true when every key was present.
-    bool readVesk(const Vesk::Element& element) override;
-    // A new "Stack" element with every key in order.
-    Quorvex::auto_ptr<Vesk::Element> writeVesk() const override;
 
     // Folder where incoming DICOM files are dropped.
     const ACE_CString& getDICOMInputDirectory() const { return m_dicomInputDirectory; }
@@ -96,10 +88,6 @@ public:
     void setVolDiscoveryMode(unsigned int value) { m_volDiscoveryMode = value; }
 
 private:
-    friend struct Fields::Access;
-    template <class Self, class Io>
-    static void fields(Self& self, Io& io);
-
     ACE_CString m_dicomInputDirectory;
     ACE_CString m_configBackupDirectoryName;
     ACE_CString m_reconstructDirectoryName;
@@ -115,10 +103,5 @@ private:
     ACE_CString m_reregistrationOtherQueueName;
     unsigned int m_volDiscoveryMode = 0;
 };
-
-CONFIGURATION_API bool operator==(const StackConfiguration__& a, const StackConfiguration__& b);
-inline bool operator!=(const StackConfiguration__& a, const StackConfiguration__& b) {
-    return !(a == b);
-}
 
 }  // namespace Configuration

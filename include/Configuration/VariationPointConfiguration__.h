@@ -10,24 +10,14 @@
 
 #include <ace/SString.h>
 
-#include "Configuration/Export.h"
-#include "Configuration/FieldAccess.h"
-#include "Vesk/Serializable.h"
+#include "Configuration/ConfigurationClass.h"
 
 namespace Configuration {
 
 class CONFIGURATION_API VariationPointConfiguration__ : public virtual Vesk::Serializable {
+    CONFIGURATION_CLASS(VariationPointConfiguration__);
+
 public:
-    VariationPointConfiguration__();
-    VariationPointConfiguration__(const VariationPointConfiguration__& other);
-    VariationPointConfiguration__& operator=(const VariationPointConfiguration__& other);
-    ~VariationPointConfiguration__() override;
-
-    // Fills the object from a "VariationPoint" element; true when every key was present.
-    bool readVesk(const Vesk::Element& element) override;
-    // A new "VariationPoint" element with both keys in order.
-    Quorvex::auto_ptr<Vesk::Element> writeVesk() const override;
-
     // Name of the auto-delete strategy; empty for the standard one.
     const ACE_CString& getAutoDeleteStrategy() const { return m_autoDeleteStrategy; }
     void setAutoDeleteStrategy(const ACE_CString& value) { m_autoDeleteStrategy = value; }
@@ -42,19 +32,8 @@ public:
     static bool isStorageCommitServiceListValueCustom(const ACE_CString& text);
 
 private:
-    friend struct Fields::Access;
-    template <class Self, class Io>
-    static void fields(Self& self, Io& io);
-
     ACE_CString m_autoDeleteStrategy;
     int m_storageCommitServiceList = 0;
 };
-
-CONFIGURATION_API bool operator==(const VariationPointConfiguration__& a,
-                                  const VariationPointConfiguration__& b);
-inline bool operator!=(const VariationPointConfiguration__& a,
-                       const VariationPointConfiguration__& b) {
-    return !(a == b);
-}
 
 }  // namespace Configuration
