@@ -3,15 +3,14 @@
 // object writes. A new class adds its two samples and one row to kClasses.
 #include <gtest/gtest.h>
 
-#include <fstream>
 #include <functional>
 #include <memory>
 #include <set>
-#include <sstream>
 #include <string>
 
 #include "Configuration/AnonParam.h"
 #include "Configuration/OrvelSystemConfiguration.h"
+#include "ElementTestSupport.h"
 #include "Vesk/XmlUtils.h"
 #include "testing/FakeMachine.h"
 #include "testing/LogCapture.h"
@@ -47,16 +46,6 @@ const ClassRow kClasses[] = {
     row<OrvelSystemConfiguration>("OrvelSystemConfiguration", kPartialDefaults, {"CORBAEndpoints"}),
 };
 
-Vesk::Element load(const std::string& file) {
-    std::ifstream in(std::string(QUORVEX_TEST_DATA) + "/classes/" + file, std::ios::binary);
-    std::ostringstream text;
-    text << in.rdbuf();
-    EXPECT_TRUE(in.good()) << file;
-    Vesk::Element tree;
-    Vesk::XmlUtils::parse(text.str().data(), text.str().size(), tree);
-    return tree;
-}
-
 // The children of element with that key, in order.
 std::vector<Vesk::Element> childrenWith(const Vesk::Element& element, const ACE_CString& key) {
     std::vector<Vesk::Element> found;
@@ -76,7 +65,7 @@ protected:
 
     Quorvex::Testing::FakeMachine m_machine;
     Quorvex::ScopedMachine m_scoped{m_machine};
-    const Vesk::Element m_sample = load(GetParam().name + ".xml");
+    const Vesk::Element m_sample = Testing::sampleDocument(GetParam().name + ".xml");
 };
 
 TEST_P(ClassSamples, SampleReadsCompleteAndWritesBackUnchanged) {
@@ -90,7 +79,7 @@ TEST_P(ClassSamples, SampleReadsCompleteAndWritesBackUnchanged) {
 }
 
 TEST_P(ClassSamples, DefaultObjectWritesTheDefaultsSample) {
-    EXPECT_EQ(Vesk::XmlUtils::toString(load(c().name + ".defaults.xml")),
+    EXPECT_EQ(Vesk::XmlUtils::toString(Testing::sampleDocument(c().name + ".defaults.xml")),
               Vesk::XmlUtils::toString(*c().make()->writeVesk()));
 }
 

@@ -96,10 +96,13 @@ struct Optional : Form {
     F inner;
     bool* seen = nullptr;
 
-    // Also records in flag whether the key was present.
-    Optional noting(bool& flag) const {
+    // Also records in flag whether the key was present (when reading: writing passes a const).
+    template <class B>
+    Optional noting(B& flag) const {
         Optional copy = *this;
-        copy.seen = &flag;
+        if constexpr (!std::is_const<B>::value) {
+            copy.seen = &flag;
+        }
         return copy;
     }
     bool read(const In& in, const char* key) const {

@@ -1,171 +1,423 @@
-// The read/write convention, exercised through a sample class holding every field type.
+// The read/write convention: one test class holds one field of every form the convention offers;
+// its written layout is pinned in tests/data/fields/Convention.xml, and each form is read,
+// written, round-tripped and compared from that one line.
+#include "Fields.h"
+
 #include <gtest/gtest.h>
 
+#include <fstream>
+#include <map>
+#include <set>
+#include <sstream>
+
+#include "ClassDefinition.h"
 #include "Configuration/AnonParam.h"
-#include "Fields.h"
+#include "Configuration/NoCaseCompare.h"
+#include "Vesk/XmlUtils.h"
 #include "testing/LogCapture.h"
 
 namespace Configuration {
 namespace {
 
-class Sample : public virtual Vesk::Serializable {
-public:
-    bool readVesk(const Vesk::Element& e) override {
-        return Fields::read(*this, e, "Sample", Fields::FailureForm::PartialDefaults);
-    }
-    Quorvex::auto_ptr<Vesk::Element> writeVesk() const override {
-        return Fields::write(*this, "Sample");
-    }
-    friend bool operator==(const Sample& a, const Sample& b) { return Fields::equal(a, b); }
+enum class Kind { Image = 0, Report = 2 };
 
+// A record kept inside a list value: no element of its own.
+struct Hop {
+    ACE_CString definition;
+    int type = 4;
+    bool enabled = true;
+    friend bool operator==(const Hop& a, const Hop& b) {
+        return a.definition == b.definition && a.type == b.type && a.enabled == b.enabled;
+    }
+
+private:
+    friend struct Fields::Access;
+    template <class Self, class Io>
+    static void fields(Self& self, Io& io) {
+        io("Definition", self.definition);
+        io("DefinitionType", self.type);
+        io("Enabled", self.enabled);
+    }
+};
+
+Kind kindFromName(const ACE_CString& text) {
+    return text == "REPORT" ? Kind::Report : Kind::Image;
+}
+ACE_CString kindName(Kind kind) {
+    return kind == Kind::Report ? "REPORT" : "IMAGE";
+}
+
+class Convention : public virtual Vesk::Serializable {
+    CONFIGURATION_CLASS(Convention);
+
+public:
+    ACE_CString name;  // attribute
     ACE_CString text = "default";
     bool flag = true;
     int number = -7;
     unsigned int count = 9;
     unsigned short port = 104;
+    std::int64_t big = 5;
+    std::uint64_t size = 6;
     BDate date{2010, 3, 4};
     BTime time{5, 6, 7};
+    BDateTime stamp{"2011-01-02T03:04:05.006"};
+    Kind kind = Kind::Image;
+    Kind named = Kind::Image;
+    unsigned int portAsSigned = 8001;
     std::vector<ACE_CString> names;
+    std::set<int> levels;
     AnonParam param;
     std::vector<AnonParam> params;
+    ACE_CString optionalText = "unchanged";
+    bool forward = true;
+    bool enabledDefault = true;
+    bool enabled = true;
+    ACE_CString txList;
+    bool hasTxList = false;
+    std::vector<AnonParam> kept;
+    std::vector<AnonParam> dropped;
+    std::map<ACE_CString, AnonParam> byTag;
+    std::set<ACE_CString, NoCaseCompare> titles;
+    std::vector<ACE_CString> listed;
+    std::vector<std::pair<ACE_CString, ACE_CString>> targets;
+    std::vector<Hop> hops;
+    ACE_CString note;            // read and written, not compared
+    std::size_t paramCount = 0;  // derived after reading
+    bool hookResult = true;
 
 private:
-    friend struct Fields::Access;
-    template <class Self, class Io>
-    static void fields(Self& s, Io& io) {
-        io("Text", s.text);
-        io("Flag", s.flag);
-        io("Number", s.number);
-        io("Count", s.count);
-        io("Port", s.port);
-        io("Date", s.date);
-        io("Time", s.time);
-        io("Name", s.names);
-        io("AnonParam", s.param);
-        io("Param", s.params);
-    }
+    bool afterRead();
 };
 
-// A tree holding only the given key/text children under element "Sample".
-Vesk::Element tree(std::initializer_list<std::pair<const char*, const char*>> children) {
-    Vesk::Element root("Sample", -1);
-    Vesk::MultiElementValue& list = root.addMultiElement();
-    for (const auto& [key, text] : children) {
-        Vesk::Element& child = list.addElement(ACE_CString(key), {}, -1);
-        if (text != nullptr) {
-            child.addSingle().assign(text);
-        }
-    }
-    return root;
+template <class Self, class Io>
+void Convention::fields(Self& self, Io& io) {
+    io("Id", Fields::attribute(self.name));
+    io("Text", self.text);
+    io("Flag", self.flag);
+    io("Number", self.number);
+    io("Count", self.count);
+    io("Port", self.port);
+    io("Big", self.big);
+    io("Size", self.size);
+    io("Date", self.date);
+    io("Time", self.time);
+    io("Stamp", self.stamp);
+    io("Kind", self.kind);
+    io("Named", Fields::text(self.named, kindFromName, kindName));
+    io("PortAsSigned", Fields::asSigned(self.portAsSigned));
+    io("Name", self.names);
+    io("Level", self.levels);
+    io("AnonParam", self.param);
+    io("Param", self.params);
+    io("OptionalText", Fields::optional(self.optionalText));
+    io("Forward", Fields::optional(self.forward, true));
+    io("EnabledDefault", Fields::optional(self.enabledDefault, true));
+    io("Enabled", Fields::optional(self.enabled, self.enabledDefault));
+    io("TxList", Fields::optional(self.txList).noting(self.hasTxList));
+    io("Kept", Fields::wrapped("Item", self.kept));
+    io("Dropped", Fields::wrapped("Item", self.dropped, Fields::DropFailed));
+    io("ByTag", Fields::wrapped("AnonParam", self.byTag, Fields::DropFailed, &AnonParam::getTag));
+    io("Titles", Fields::listValue(self.titles));
+    io("Listed", Fields::listValue(self.listed));
+    io("Targets", Fields::pairs(self.targets, "Persistent", "Mirror"));
+    io("Hops", Fields::listValue(self.hops));
+    io("Note", Fields::uncompared(self.note));
+    io("ParamCount", Fields::derived(self.paramCount));
 }
 
-Sample filled() {
-    Sample s;
-    s.text = "a<b>&\"c'";
-    s.flag = false;
-    s.number = -2147483647 - 1;
-    s.count = 4294967295u;
-    s.port = 65535;
-    s.date = BDate(2024, 2, 29);
-    s.time = BTime(23, 59, 59, 999);
-    s.names = {"one", "", "three"};
-    s.param.setTag("0010,0010");
+CONFIGURATION_DEFINE(Convention, "Convention", Fields::FailureForm::PartialDefaults)
+
+// Derived data follows the fields; the hook's false makes the read incomplete.
+bool Convention::afterRead() {
+    paramCount = params.size();
+    return hookResult;
+}
+
+AnonParam param(const char* tag, const char* value) {
     AnonParam p;
-    p.setValue("anon");
-    s.params = {p, AnonParam()};
-    return s;
+    p.setTag(tag);
+    p.setValue(value);
+    return p;
 }
 
-// "key=text" for each child of s's tree, in order ("key" alone when its value is not a text).
-std::string written(const Sample& s) {
-    std::string out;
-    const Quorvex::auto_ptr<Vesk::Element> root = s.writeVesk();
-    for (const Vesk::Element& child : root->getMultiElement()) {
-        out += child.key().c_str();
-        if (child.value().kind() == Vesk::Value::Kind::Single) {
-            out += std::string("=") + child.getSingle().value().c_str();
+// Every field away from its default.
+Convention filled() {
+    Convention c;
+    c.name = "rule 1";
+    c.text = "a<b>&\"c'";
+    c.flag = false;
+    c.number = -2147483647 - 1;
+    c.count = 4294967295u;
+    c.port = 65535;
+    c.big = -9007199254740993;
+    c.size = 18446744073709551615u;
+    c.date = BDate(2024, 2, 29);
+    c.time = BTime(23, 59, 59, 999);
+    c.stamp = BDateTime("2024-02-29T23:59:59.999");
+    c.kind = Kind::Report;
+    c.named = Kind::Report;
+    c.portAsSigned = 4294967295u;
+    c.names = {"one", "", "three"};
+    c.levels = {3, -1, 7};
+    c.param = param("0010,0010", "anon");
+    c.params = {param("0008,0020", ""), AnonParam()};
+    c.paramCount = 2;
+    c.optionalText = "given";
+    c.forward = false;
+    c.enabledDefault = false;
+    c.enabled = false;
+    c.txList = "1,2";
+    c.hasTxList = true;
+    c.kept = {param("k", "1")};
+    c.dropped = {param("d", "2")};
+    c.byTag = {{"0010,0010", param("0010,0010", "x")}, {"0010,0020", param("0010,0020", "y")}};
+    c.titles = {"AE_ONE", "ae_two"};
+    c.listed = {"z", "a"};
+    c.targets = {{"DIRECT=OS:p1\\private$\\quorvexin", "DIRECT=OS:m1\\private$\\quorvexin"}};
+    c.hops = {Hop{"DIRECT=OS:h\\private$\\q", 1, false}};
+    c.note = "free text";
+    return c;
+}
+
+std::string dataFile(const char* name) {
+    std::ifstream in(std::string(QUORVEX_TEST_DATA) + "/fields/" + name, std::ios::binary);
+    std::ostringstream text;
+    text << in.rdbuf();
+    return text.str();
+}
+
+Vesk::Element parsed(const std::string& xml) {
+    Vesk::Element tree;
+    Vesk::XmlUtils::parse(xml.data(), xml.size(), tree);
+    return tree;
+}
+
+// The written form of every field, pinned.
+const Vesk::Element& sample() {
+    static const Vesk::Element tree = parsed(dataFile("Convention.xml"));
+    return tree;
+}
+
+// sample() with its children of key removed, and extra appended.
+Vesk::Element edited(const char* key, std::initializer_list<Vesk::Element> extra = {}) {
+    Vesk::Element copy(sample().key(), -1);
+    copy.insertAttributes(sample().attributes());
+    Vesk::MultiElementValue& children = copy.addMultiElement();
+    for (const Vesk::Element& child : sample().getMultiElement()) {
+        if (child.key() != key) {
+            children.addElement(child);
         }
-        out += " ";
     }
-    return out;
+    for (const Vesk::Element& e : extra) {
+        children.addElement(e);
+    }
+    return copy;
 }
 
-TEST(FieldsRoundTrip, CanonicalTextsInDeclaredOrderReadBackEqual) {
-    EXPECT_EQ(written(filled()),
-              "Text=a<b>&\"c' Flag=0 Number=-2147483648 Count=4294967295 "
-              "Port=65535 Date=2024-02-29 Time=" +
-                  std::string(BTime(23, 59, 59, 999).ToString().c_str()) +
-                  " Name=one Name= Name=three AnonParam Param Param ");
-    Sample read;
-    EXPECT_TRUE(read.readVesk(*filled().writeVesk()));
+Vesk::Element single(const char* key, const char* text) {
+    Vesk::Element e(key, -1);
+    e.addSingle().assign(text);
+    return e;
+}
+
+// A wrapper key holding item children given as (itemKey, tag, value) triples; a null tag leaves
+// the item without "Tag".
+Vesk::Element wrapper(const char* key, const char* itemKey,
+                      std::initializer_list<std::pair<const char*, const char*>> items) {
+    Vesk::Element e(key, -1);
+    Vesk::MultiElementValue& list = e.addMultiElement();
+    for (const auto& [tag, value] : items) {
+        Vesk::MultiElementValue& item = list.addElement(itemKey, {}, -1).addMultiElement();
+        if (tag != nullptr) {
+            item.addElement(single("Tag", tag));
+        }
+        item.addElement(single("Value", value));
+        item.addElement(single("Description", ""));
+    }
+    return e;
+}
+
+TEST(ConventionForms, FilledObjectWritesThePinnedLayoutAndReadsBackEqual) {
+    EXPECT_EQ(Vesk::XmlUtils::toString(sample(), Vesk::Ordering::indented()),
+              Vesk::XmlUtils::toString(*filled().writeVesk(), Vesk::Ordering::indented()));
+    Convention read;
+    EXPECT_TRUE(read.readVesk(sample()));
     EXPECT_TRUE(read == filled());
+    EXPECT_EQ(2u, read.paramCount);
 }
 
-TEST(FieldsReading, MissingKeyKeepsTheFieldReportsFalseAndReadingGoesOn) {
-    Sample s;
-    EXPECT_FALSE(s.readVesk(tree({{"Text", "x"}, {"Port", "2000"}})));
-    EXPECT_EQ(s.text, "x");
-    EXPECT_EQ(s.port, 2000);  // read although keys before it were missing
-    EXPECT_EQ(s.number, -7);
-    Vesk::Element otherKind("Sample", -1);  // a child of another value kind counts as missing
-    otherKind.addMultiElement().addElement("Text", {}, -1).addMulti();
-    EXPECT_FALSE(s.readVesk(otherKind));
-    EXPECT_EQ(s.text, "x");
+struct AbsentCase {
+    const char* key;
+    bool complete;  // whether the read still counts as complete
+};
 
-    Quorvex::auto_ptr<Vesk::Element> complete = Sample().writeVesk();
-    s.names = {"stale"};
-    EXPECT_TRUE(s.readVesk(*complete));  // absent lists are empty, not missing
-    EXPECT_TRUE(s.names.empty());
-    complete->getMultiElement().getElement("AnonParam").addMultiElement();
-    EXPECT_FALSE(Sample().readVesk(*complete));  // a key missing in a nested object counts
+// Optional keys, lists and derived data do not make a read incomplete; everything else does.
+TEST(ConventionForms, WhichAbsentKeysMakeTheReadIncomplete) {
+    const AbsentCase cases[] = {
+        {"Text", false},         {"Flag", false},        {"Kind", false},    {"Named", false},
+        {"PortAsSigned", false}, {"Name", true},         {"Level", true},    {"AnonParam", false},
+        {"Param", true},         {"OptionalText", true}, {"Forward", true},  {"Enabled", true},
+        {"TxList", true},        {"Kept", false},        {"Dropped", false}, {"ByTag", false},
+        {"Titles", false},       {"Targets", false},     {"Hops", false},    {"Note", false},
+        {"ParamCount", true}};
+    for (const AbsentCase& c : cases) {
+        Convention read;
+        EXPECT_EQ(c.complete, read.readVesk(edited(c.key))) << c.key;
+    }
+    Vesk::Element bare(sample().key(), -1);
+    bare.setValue(sample().getMultiElement().clone());
+    EXPECT_FALSE(Convention().readVesk(bare));  // the "Id" attribute counts as a key
 }
 
-TEST(FieldsReading, ChildWithoutValueEmptiesTheField) {
-    Sample s;
-    s.readVesk(tree({{"Text", nullptr}, {"Flag", nullptr}, {"Number", nullptr}}));
-    EXPECT_EQ(s.text, "");
-    EXPECT_FALSE(s.flag);
-    EXPECT_EQ(s.number, 0);
+TEST(ConventionForms, AbsentOptionalKeysKeepTakeOrCopyTheirValues) {
+    Convention read = filled();
+    EXPECT_TRUE(read.readVesk(edited("OptionalText")));
+    EXPECT_EQ("given", read.optionalText);  // unchanged
+    read.forward = false;
+    read.readVesk(edited("Forward"));
+    EXPECT_TRUE(read.forward);  // the given value
+    read.readVesk(edited("Enabled"));
+    EXPECT_FALSE(read.enabled);  // the value just read for EnabledDefault
+    read.readVesk(edited("Enabled", {single("Enabled", "1")}));
+    EXPECT_TRUE(read.enabled);
+    read.readVesk(edited("TxList"));
+    EXPECT_FALSE(read.hasTxList);
+    read.readVesk(edited("TxList", {single("TxList", "")}));
+    EXPECT_TRUE(read.hasTxList);
 }
 
-TEST(FieldsReading, FirstSameKeyChildWinsAndUnparsableTextKeepsTheField) {
-    Sample s;
-    s.readVesk(tree({{"Text", "first"},
-                     {"Text", "second"},
-                     {"Flag", "true"},
-                     {"Number", " 42xyz"},
-                     {"Count", "x1"},
-                     {"Port", "70000"}}));
-    EXPECT_EQ(s.text, "first");
-    EXPECT_TRUE(s.flag);      // only "1"/"0" are flags
-    EXPECT_EQ(s.number, 42);  // leading blanks skipped, trailing text ignored
-    EXPECT_EQ(s.count, 9u);
-    EXPECT_EQ(s.port, 104);  // out of range for 16 bits
+TEST(ConventionForms, ListPoliciesKeepOrDropIncompleteItems) {
+    Convention read;
+    EXPECT_FALSE(read.readVesk(
+        edited("Kept", {wrapper("Kept", "Item", {{"a", "1"}, {nullptr, "2"}, {"c", "3"}})})));
+    ASSERT_EQ(3u, read.kept.size());
+    EXPECT_EQ("2", read.kept[1].getValue());
+    EXPECT_FALSE(read.readVesk(
+        edited("Dropped", {wrapper("Dropped", "Item", {{"a", "1"}, {nullptr, "2"}, {"c", "3"}})})));
+    ASSERT_EQ(2u, read.dropped.size());
+    EXPECT_EQ("3", read.dropped[1].getValue());
+    Vesk::Element emptyWrapper("Kept", -1);  // a wrapper without a value empties the list
+    EXPECT_TRUE(read.readVesk(edited("Kept", {emptyWrapper})));
+    EXPECT_TRUE(read.kept.empty());
 }
 
-TEST(FieldsReading, WrongRootValueLogsThePartialDefaultsFormAndKeepsDefaults) {
+TEST(ConventionForms, MapsKeepTheLaterItemAndSetsFoldCase) {
+    Convention read;
+    EXPECT_TRUE(read.readVesk(edited(
+        "ByTag", {wrapper("ByTag", "AnonParam", {{"t", "first"}, {"u", "x"}, {"t", "later"}})})));
+    ASSERT_EQ(2u, read.byTag.size());
+    EXPECT_EQ("later", read.byTag["t"].getValue());
+
+    Vesk::Element titles("Titles", -1);
+    Vesk::MultiValue& values = titles.addMulti();
+    for (const char* t : {"ae1", "AE1", "Ae2"}) {
+        values.addSingle().assign(t);
+    }
+    values.addMulti();  // a value of another kind reads as an empty title
+    EXPECT_TRUE(read.readVesk(edited("Titles", {titles})));
+    EXPECT_EQ(3u, read.titles.size());
+    EXPECT_EQ(1u, read.titles.count("AE2"));
+}
+
+TEST(ConventionForms, NumbersStoredSignedEnumerationsAndNamedTexts) {
+    Convention read;
+    read.readVesk(edited("PortAsSigned", {single("PortAsSigned", "-2")}));
+    EXPECT_EQ(4294967294u, read.portAsSigned);
+    EXPECT_EQ("-2",
+              read.writeVesk()->getMultiElement().getElement("PortAsSigned").getSingle().value());
+    read.readVesk(edited("Kind", {single("Kind", "2")}));
+    EXPECT_EQ(Kind::Report, read.kind);
+    read.readVesk(edited("Named", {single("Named", "report")}));  // names are case-sensitive
+    EXPECT_EQ(Kind::Image, read.named);
+}
+
+TEST(ConventionEquality, EveryComparedFieldTakesPartAndCaseMatters) {
+    // filled() differs from the defaults in every field, so hiding any one key changes the read,
+    // except for the uncompared note and "Enabled", which then copies the "EnabledDefault" read.
+    for (const Vesk::Element& child : sample().getMultiElement()) {
+        Convention read;
+        read.readVesk(edited(child.key().c_str()));
+        EXPECT_EQ(child.key() == "Note" || child.key() == "Enabled", read == filled())
+            << child.key().c_str();
+    }
+    Convention other = filled();
+    other.text = "A<B>&\"C'";
+    EXPECT_TRUE(other != filled());
+}
+
+TEST(ConventionReading, ChildWithoutValueEmptiesTheFieldAndUnparsableTextKeepsIt) {
+    Vesk::Element noValue("Text", -1);
+    Convention read = filled();
+    EXPECT_TRUE(read.readVesk(edited("Text", {noValue})));
+    EXPECT_EQ("", read.text);
+    const std::pair<const char*, const char*> kept[] = {
+        {"Flag", "true"}, {"Count", "x1"}, {"Port", "70000"}, {"Number", "--1"}};
+    for (const auto& [key, text] : kept) {
+        Convention c = filled();
+        EXPECT_TRUE(c.readVesk(edited(key, {single(key, text)})));
+        EXPECT_TRUE(c == filled()) << key;
+    }
+    Convention c;
+    c.readVesk(edited("Number", {single("Number", " 42xyz"), single("Number", "43")}));
+    EXPECT_EQ(42, c.number);  // leading blanks skipped, trailing text ignored, first child wins
+}
+
+TEST(ConventionReading, HookResultJoinsTheRead) {
+    Convention read;
+    read.hookResult = false;
+    EXPECT_FALSE(read.readVesk(sample()));
+    EXPECT_EQ(2u, read.paramCount);
+}
+
+// Hostile trees end in a logged, failed read, never a crash.
+TEST(ConventionReading, WrongValueKindsLogTheFailureAndHugeListsRead) {
     Quorvex::Testing::LogCapture log;
-    Vesk::Element t("Sample", -1);
-    t.addSingle().assign("not a list");
-    Sample s;
-    EXPECT_FALSE(s.readVesk(t));
-    EXPECT_TRUE(s == Sample());
-    ASSERT_EQ(log.records().size(), 1u);
-    EXPECT_EQ(log.records()[0].priority, LM_ERROR);
-    EXPECT_EQ(log.records()[0].text.rfind(
-                  "Sample::readVesk: Failed - Using partial defaults. Standard Exception: ", 0),
-              0u);
+    Vesk::Element notAList("Titles", -1);
+    notAList.addMultiElement();
+    Vesk::Element notAWrapper("Kept", -1);
+    notAWrapper.addSingle().assign("x");
+    for (const Vesk::Element& bad : {notAList, notAWrapper}) {
+        Convention read;
+        EXPECT_FALSE(read.readVesk(edited(bad.key().c_str(), {bad})));
+    }
+    ASSERT_EQ(2u, log.records().size());
+    EXPECT_EQ(
+        0u, log.records()[0].text.rfind(
+                "Convention::readVesk: Failed - Using partial defaults. Standard Exception: ", 0));
+
+    Vesk::Element many("Listed", -1);
+    Vesk::MultiValue& values = many.addMulti();
+    for (int i = 0; i < 100000; ++i) {
+        values.addSingle().assign("v");
+    }
+    Convention read;
+    EXPECT_TRUE(read.readVesk(edited("Listed", {many})));
+    EXPECT_EQ(100000u, read.listed.size());
 }
 
-TEST(FieldsEquality, EveryFieldTakesPart) {
-    // filled() differs from the defaults in every field, so hiding any one key changes the read.
-    for (const char* key : {"Text", "Flag", "Number", "Count", "Port", "Date", "Time", "Name",
-                            "AnonParam", "Param"}) {
-        Quorvex::auto_ptr<Vesk::Element> t = filled().writeVesk();
-        t->getMultiElement().getElement(key).setKey("Hidden");
-        Sample read;
-        read.readVesk(*t);
-        EXPECT_FALSE(read == filled()) << key;
+class ReadOnly : public virtual Vesk::Serializable {
+    CONFIGURATION_CLASS(ReadOnly);
+
+public:
+    ACE_CString value;
+};
+
+template <class Self, class Io>
+void ReadOnly::fields(Self& self, Io& io) {
+    io("Value", self.value);
+}
+
+CONFIGURATION_DEFINE_READ(ReadOnly, Fields::FailureForm::Failed)
+CONFIGURATION_DEFINE_NO_WRITE(ReadOnly, "ReadOnly::writeVesk - Not supported.")
+CONFIGURATION_DEFINE_EQUAL(ReadOnly)
+
+TEST(ConventionWriting, ReadOnlyClassRefusesWithItsText) {
+    try {
+        ReadOnly().writeVesk();
+        FAIL() << "writeVesk of a read-only class returned";
+    } catch (const std::exception& e) {
+        EXPECT_STREQ("ReadOnly::writeVesk - Not supported.", e.what());
     }
 }
 

@@ -2,7 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include "ElementTestSupport.h"
 #include "testing/FakeMachine.h"
 
 namespace {
@@ -49,24 +48,6 @@ TEST(StackConfigurationDirectories, MountPointFollowsTheExecutablesDrive) {
     EXPECT_EQ("E:\\Quorvex\\MultiStack\\", mountPointOn(machine));
     machine.executable = "\\\\store\\apps\\server.exe";
     EXPECT_EQ("\\\\store\\apps\\Quorvex\\MultiStack\\", mountPointOn(machine));
-}
-
-TEST(StackConfigurationElement, WritesEveryKeyInOrder) {
-    FakeMachine machine;
-    ScopedMachine scoped(machine);
-    const auto element = StackConfiguration__().writeVesk();
-    EXPECT_EQ("Stack", std::string(element->key().c_str()));
-    EXPECT_EQ(
-        (std::vector<std::string>{
-            "DICOMInputDirectory", "ConfigBackupDirectoryName", "ReconstructDirectoryName",
-            "MountPointRootDirectory", "ReconstructDirectoryNeedsRebuild",
-            "ReconstructDirectoryNeedsReregistration",
-            "ReconstructDirectoryNeedsInternalReregistration", "ReconstructDirectoryNeedsMigration",
-            "ReconstructDirectoryNeedsReArchive", "ReconstructMigrationTarget",
-            "ReconstructMigrationOtherTargetName", "ReconstructReregistrationQueue",
-            "ReconstructReregistrationOtherQueueName", "VolDiscoveryMode"}),
-        Configuration::Testing::childKeys(*element));
-    EXPECT_EQ("1", Configuration::Testing::childText(*element, "ReconstructReregistrationQueue"));
 }
 
 // Guards that a stored directory replaces the machine-derived default on reading.

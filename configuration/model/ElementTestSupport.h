@@ -1,27 +1,25 @@
-// Test helpers for looking into written element trees: the keys of an element's children in
-// order, the text of one child, and a copy of an element without one of its children.
+// Test helpers for element trees: a class's sample document from tests/data/classes, and copies
+// of an element without, or with another, child of one key.
 #pragma once
 
+#include <fstream>
+#include <sstream>
 #include <string>
-#include <vector>
 
 #include "Vesk/Element.h"
+#include "Vesk/XmlUtils.h"
 
 namespace Configuration {
 namespace Testing {
 
-// The keys of element's children, in order.
-inline std::vector<std::string> childKeys(const Vesk::Element& element) {
-    std::vector<std::string> keys;
-    for (const Vesk::Element& child : element.getMultiElement()) {
-        keys.emplace_back(child.key().c_str());
-    }
-    return keys;
-}
-
-// The text of element's first child with that key.
-inline std::string childText(const Vesk::Element& element, const char* key) {
-    return element.getMultiElement().getElement(ACE_CString(key)).getSingle().value().c_str();
+// The tree of tests/data/classes/file.
+inline Vesk::Element sampleDocument(const std::string& file) {
+    std::ifstream in(std::string(QUORVEX_TEST_DATA) + "/classes/" + file, std::ios::binary);
+    std::ostringstream text;
+    text << in.rdbuf();
+    Vesk::Element tree;
+    Vesk::XmlUtils::parse(text.str().data(), text.str().size(), tree);
+    return tree;
 }
 
 // A copy of element without its children of that key.
