@@ -9,7 +9,7 @@ seconds=${1:-60}
 shift || true
 targets=("$@")
 [ ${#targets[@]} -gt 0 ] || targets=(xml_reader_fuzz stored_form_decode_fuzz base64_decode_fuzz
-                                   date_parse_fuzz zstream_decode_fuzz)
+                                   date_parse_fuzz zstream_decode_fuzz class_read_fuzz)
 "$root/scripts/install-deps.sh"
 CC=clang CXX=clang++ "$root/scripts/build.sh" "$root/build-fuzz" -DQUORVEX_FUZZ=ON \
   -DQUORVEX_TESTS=OFF -DQUORVEX_BENCH=OFF
@@ -20,6 +20,8 @@ for t in "${targets[@]}"; do
   echo "=== $t for ${seconds}s"
   seeds=()
   [ -d "$root/fuzz/seeds/$t" ] && seeds=("$root/fuzz/seeds/$t")
+  # The class reader starts from the classes' sample documents.
+  [ "$t" = class_read_fuzz ] && seeds=("$root/tests/data/classes" "$root/tests/data/fields")
   "$root/build-fuzz/fuzz/$t" -max_total_time="$seconds" -max_len=65536 -rss_limit_mb=2048 \
     -artifact_prefix="$crashes/" -print_final_stats=1 "$corpus" "${seeds[@]}" 2>&1 | tail -n 12
 done
