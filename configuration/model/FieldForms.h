@@ -280,7 +280,7 @@ struct ListValue : Form {
         const Vesk::MultiValue& values = child->hasValue() ? child->getMulti() : empty;
         return readItems(
             container, values, policy,
-            [this](const Vesk::Value& value, auto& item) { return readOne(value, item); }, NoKey());
+            [&](const Vesk::Value& value, auto& item) { return readOne(value, item); }, NoKey());
     }
     void write(Out& out, const char* key) const {
         Vesk::MultiValue& values =
