@@ -9,7 +9,7 @@
 
 #include "InProcessService.h"
 #include "RawPost.h"
-#include "repository/DirectoryStore.h"
+#include "Store/DirectoryStore.h"
 
 namespace ConfigurationService {
 namespace {

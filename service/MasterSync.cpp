@@ -1,8 +1,8 @@
 #include "MasterSync.h"
 
 #include "Quorvex/Log.h"
+#include "Store/ItemDiff.h"
 #include "TimeText.h"
-#include "repository/ItemDiff.h"
 
 namespace ConfigurationService {
 namespace {

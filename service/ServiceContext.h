@@ -8,7 +8,7 @@
 
 #include "ChangeNotifier.h"
 #include "MasterLink.h"
-#include "repository/DirectoryStore.h"
+#include "Store/DirectoryStore.h"
 
 namespace ConfigurationService {
 

@@ -6,7 +6,7 @@
 
 #include <string>
 
-#include "repository/DirectoryStore.h"
+#include "Store/DirectoryStore.h"
 
 namespace ConfigurationService {
 

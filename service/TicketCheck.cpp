@@ -3,7 +3,7 @@
 
 #include <stdexcept>
 
-#include "repository/ServiceTicketModule.h"
+#include "Client/ServiceTicketModule.h"
 
 namespace ConfigurationService {
 namespace {

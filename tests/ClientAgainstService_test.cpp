@@ -8,8 +8,8 @@
 #include "Configuration/StoredForm.h"
 #include "InProcessService.h"
 #include "Quorvex/BDateTime.h"
+#include "Store/DirectoryStore.h"
 #include "Vesk/XmlUtils.h"
-#include "repository/DirectoryStore.h"
 
 namespace Configuration {
 namespace {

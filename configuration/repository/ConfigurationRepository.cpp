@@ -10,12 +10,12 @@
 #include <stdexcept>
 
 #include "Common/NamedEvent.h"
-#include "Configuration/OrvelSystemConfiguration.h"
 #include "Configuration/ServiceLocation.h"
 #include "Quorvex/Host.h"
 #include "Quorvex/Log.h"
 #include "model/DocumentCodec.h"
 #include "repository/HttpServiceConnection.h"
+#include "repository/MasterSource.h"
 #include "repository/StoreServiceConnection.h"
 
 namespace Configuration {
@@ -33,17 +33,6 @@ std::shared_ptr<ServiceConnector> connectorFromEnvironment() {
     return std::make_shared<HttpServiceConnector>(std::move(location));
 }
 
-// Reads the machine's system document and takes its master configuration host.
-void learnMaster(ConfigurationRepository& repository) {
-    OrvelSystemConfiguration system;
-    if (repository.GetLatest(system, true) != 0) {
-        QUORVEX_LOG(LM_DEBUG,
-                    "ConfigurationRepository::instance: no system configuration; this machine is "
-                    "its own master\n");
-    }
-    repository.SetMasterHostName(system.getMasterConfigurationServiceHostName());
-}
-
 }  // namespace
 
 ConfigurationRepository* ConfigurationRepository::instance() {
@@ -59,7 +48,7 @@ ConfigurationRepository* ConfigurationRepository::instance() {
     repository = s_instance.load(std::memory_order_relaxed);
     if (repository == nullptr) {
         auto created = std::make_unique<ConfigurationRepository>(connectorFromEnvironment());
-        learnMaster(*created);
+        created->SetMasterHostName(machineMasterSource().masterHostName(*created));
         repository = created.release();
         s_instance.store(repository, std::memory_order_release);
     }

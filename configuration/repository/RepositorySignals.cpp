@@ -3,7 +3,7 @@
 
 #include "Configuration/ConfigurationRepository.h"
 #include "Quorvex/Log.h"
-#include "repository/ItemDiff.h"
+#include "Store/ItemDiff.h"
 #include "repository/ServiceConnection.h"
 
 namespace Configuration {

@@ -6,7 +6,7 @@
 
 #include <memory>
 
-#include "repository/DirectoryStore.h"
+#include "Store/DirectoryStore.h"
 #include "repository/ServiceConnection.h"
 
 namespace Configuration {

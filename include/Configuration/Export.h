@@ -1,8 +1,6 @@
-// CONFIGURATION_API marks what libConfiguration.so exports; everything else stays hidden.
+// CONFIGURATION_API marks what libConfiguration.so exports. The library is compiled with hidden
+// visibility, so only the classes and functions marked here are visible to its users; a user's
+// compilation sees the same attribute, which on Linux both exports and imports.
 #pragma once
 
-#if defined(CONFIGURATION_BUILDING_LIBRARY) || defined(CONFIGURATION_USING_SHARED)
 #define CONFIGURATION_API __attribute__((visibility("default")))
-#else
-#define CONFIGURATION_API __attribute__((visibility("default")))
-#endif

@@ -1,5 +1,5 @@
 // Atomic, durable file replacement in one locked directory (write, fdatasync, rename, fsync).
-#include "repository/DurableDirectory.h"
+#include "Store/DurableDirectory.h"
 
 #include <dirent.h>
 #include <fcntl.h>

@@ -1,5 +1,5 @@
 // The embedded directory store: exact bytes and names, times, persistence, locking, recovery.
-#include "repository/DirectoryStore.h"
+#include "Store/DirectoryStore.h"
 
 #include <gtest/gtest.h>
 

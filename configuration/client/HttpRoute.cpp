@@ -1,4 +1,4 @@
-#include "repository/HttpRoute.h"
+#include "client/HttpRoute.h"
 
 #include <cctype>
 

@@ -1,5 +1,5 @@
 // Percent-encoding of host and configuration names into safe, reversible file names.
-#include "repository/StoreFileName.h"
+#include "StoreFileName.h"
 
 #include <algorithm>
 #include <cstdint>

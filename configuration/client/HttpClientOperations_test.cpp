@@ -7,7 +7,7 @@
 #include "Configuration/HttpConfigurationException.h"
 #include "Quorvex/BDateTime.h"
 #include "Quorvex/Host.h"
-#include "repository/HttpClientTestSupport.h"
+#include "client/HttpClientTestSupport.h"
 #include "testing/LogCapture.h"
 
 namespace Configuration {

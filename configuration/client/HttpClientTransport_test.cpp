@@ -8,9 +8,9 @@
 #include <cstdlib>
 
 #include "Configuration/HttpConfigurationTransportException.h"
-#include "repository/HttpClientTestSupport.h"
-#include "repository/HttpRoute.h"
-#include "repository/HttpTransport.h"
+#include "client/HttpClientTestSupport.h"
+#include "client/HttpRoute.h"
+#include "client/HttpTransport.h"
 #include "testing/LogCapture.h"
 #include "testing/ScratchDir.h"
 #include "testing/TestCertificates.h"

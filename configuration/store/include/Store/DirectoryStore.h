@@ -24,8 +24,8 @@
 #include <unordered_map>
 #include <vector>
 
-#include "repository/DurableDirectory.h"
-#include "repository/SiteRegistry.h"
+#include "Store/DurableDirectory.h"
+#include "Store/SiteRegistry.h"
 
 namespace Configuration {
 

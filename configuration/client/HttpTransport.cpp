@@ -1,4 +1,4 @@
-#include "repository/HttpTransport.h"
+#include "client/HttpTransport.h"
 
 #include <curl/curl.h>
 
@@ -6,7 +6,7 @@
 #include <string>
 
 #include "Quorvex/Log.h"
-#include "repository/HttpRoute.h"
+#include "client/HttpRoute.h"
 
 namespace Configuration {
 

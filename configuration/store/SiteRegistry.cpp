@@ -1,11 +1,11 @@
 // Registered services and site settings, and their line-per-record text form.
-#include "repository/SiteRegistry.h"
+#include "Store/SiteRegistry.h"
 
 #include <ace/OS_NS_strings.h>
 
 #include <sstream>
 
-#include "repository/StoreFileName.h"
+#include "StoreFileName.h"
 
 namespace Configuration {
 namespace {

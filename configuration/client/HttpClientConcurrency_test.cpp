@@ -8,7 +8,7 @@
 #include <thread>
 
 #include "Quorvex/Base64Coder.h"
-#include "repository/HttpClientTestSupport.h"
+#include "client/HttpClientTestSupport.h"
 
 namespace Configuration {
 namespace {

@@ -7,9 +7,9 @@
 #include <cstdlib>
 #include <fstream>
 
+#include "Client/ServiceTicketModule.h"
 #include "ServerInterop/ServerInteropAPI.h"
-#include "repository/HttpClientTestSupport.h"
-#include "repository/ServiceTicketModule.h"
+#include "client/HttpClientTestSupport.h"
 #include "testing/LogCapture.h"
 #include "testing/ScratchDir.h"
 

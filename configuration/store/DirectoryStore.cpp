@@ -1,14 +1,14 @@
 // The embedded directory store: items in memory, each mirrored durably by one file.
-#include "repository/DirectoryStore.h"
+#include "Store/DirectoryStore.h"
 
 #include <cstring>
 #include <stdexcept>
 
+#include "ItemFile.h"
 #include "Quorvex/Host.h"
 #include "Quorvex/Log.h"
 #include "Quorvex/Machine.h"
-#include "repository/ItemFile.h"
-#include "repository/StoreFileName.h"
+#include "StoreFileName.h"
 
 namespace Configuration {
 namespace {

@@ -1,4 +1,4 @@
-#include "repository/ServiceTicketModule.h"
+#include "Client/ServiceTicketModule.h"
 
 #include <dlfcn.h>
 #include <limits.h>

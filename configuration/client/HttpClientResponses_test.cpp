@@ -7,7 +7,7 @@
 #include "Configuration/HttpConfigurationInvalidNodeIdException.h"
 #include "Configuration/HttpConfigurationItemLimitReachedException.h"
 #include "Configuration/HttpConfigurationPathNotFoundException.h"
-#include "repository/HttpClientTestSupport.h"
+#include "client/HttpClientTestSupport.h"
 
 namespace Configuration {
 namespace {

@@ -1,4 +1,4 @@
-#include "repository/ItemDiff.h"
+#include "Store/ItemDiff.h"
 
 #include <algorithm>
 #include <iterator>

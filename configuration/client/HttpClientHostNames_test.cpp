@@ -2,7 +2,7 @@
 #include <gtest/gtest.h>
 
 #include "Configuration/HttpConfigurationException.h"
-#include "repository/HttpClientTestSupport.h"
+#include "client/HttpClientTestSupport.h"
 
 namespace Configuration {
 namespace {

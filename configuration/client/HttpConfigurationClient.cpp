@@ -10,6 +10,7 @@
 #include <string>
 #include <string_view>
 
+#include "Client/ServiceTicketModule.h"
 #include "Configuration/ErrorData.h"
 #include "Configuration/HttpConfigurationFolderLimitReachedException.h"
 #include "Configuration/HttpConfigurationInvalidNodeIdException.h"
@@ -18,9 +19,8 @@
 #include "Configuration/HttpConfigurationTransportException.h"
 #include "Quorvex/Log.h"
 #include "Quorvex/TextConversion.h"
-#include "repository/HostNameMap.h"
-#include "repository/HttpTransport.h"
-#include "repository/ServiceTicketModule.h"
+#include "client/HostNameMap.h"
+#include "client/HttpTransport.h"
 
 namespace Configuration {
 

@@ -1,5 +1,5 @@
 // Safe file names for the directory store: reversible, and never able to leave the directory.
-#include "repository/StoreFileName.h"
+#include "StoreFileName.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "repository/HostNameMap.h"
+#include "client/HostNameMap.h"
 
 #include <ace/Guard_T.h>
 #include <ace/Object_Manager.h>

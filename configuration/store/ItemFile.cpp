@@ -1,10 +1,10 @@
 // Header writing and strict parsing of item files.
-#include "repository/ItemFile.h"
+#include "ItemFile.h"
 
 #include <cerrno>
 #include <cstdlib>
 
-#include "repository/StoreFileName.h"
+#include "StoreFileName.h"
 
 namespace Configuration {
 namespace {
