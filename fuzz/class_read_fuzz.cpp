@@ -1,14 +1,18 @@
 // Configuration classes fed arbitrary XML: every class (and the convention's test class, which has
 // a field of every form) reads whatever tree the XML reader accepts. What an object writes must
 // read back complete, and equal to it when its own read was complete (a read cut short by a
-// failure leaves derived data unresolved). readVesk never throws; any mismatch aborts.
+// failure leaves derived data unresolved). A read-only class reads the tree twice (the second
+// read appends) and refuses to write. readVesk never throws; any mismatch aborts.
 #include <cstddef>
 #include <cstdint>
 #include <cstdlib>
 #include <exception>
 
 #include "Configuration/AnonParam.h"
+#include "Configuration/DMWLTarget.h"
+#include "Configuration/DicomClientConfiguration.h"
 #include "Configuration/OrvelSystemConfiguration.h"
+#include "Configuration/SOPServiceConfiguration.h"
 #include "ConventionSample.h"
 #include "Vesk/XmlUtils.h"
 
@@ -22,6 +26,23 @@ void readWriteRead(const Vesk::Element& tree) {
     if (!second.readVesk(*first.writeVesk()) || (complete && !(first == second))) {
         std::abort();
     }
+}
+
+template <class T>
+void readTwiceRefuseWrite(const Vesk::Element& tree) {
+    T object;
+    object.readVesk(tree);
+    object.readVesk(tree);
+    const T copy = object;
+    if (!(copy == object)) {
+        std::abort();
+    }
+    try {
+        object.writeVesk();
+    } catch (const std::exception&) {
+        return;
+    }
+    std::abort();
 }
 
 }  // namespace
@@ -38,6 +59,18 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     readWriteRead<Configuration::VariationPointConfiguration__>(tree);
     readWriteRead<Configuration::StackConfiguration__>(tree);
     readWriteRead<Configuration::OrvelSystemConfiguration>(tree);
+    readWriteRead<Configuration::SOPClass>(tree);
+    readWriteRead<Configuration::DMWLTarget>(tree);
+    readWriteRead<Configuration::DicomClientConfiguration>(tree);
+    readTwiceRefuseWrite<Configuration::SupportedTransferSyntax>(tree);
+    readTwiceRefuseWrite<Configuration::SupportedTransferSyntaxList>(tree);
+    readTwiceRefuseWrite<Configuration::TemplateTransferSyntaxList>(tree);
+    readTwiceRefuseWrite<Configuration::TemplateTransferSyntaxLists>(tree);
+    readTwiceRefuseWrite<Configuration::SOPService>(tree);
+    readTwiceRefuseWrite<Configuration::SOPServiceList>(tree);
+    readTwiceRefuseWrite<Configuration::FilterTag>(tree);
+    readTwiceRefuseWrite<Configuration::FilterTagList>(tree);
+    readTwiceRefuseWrite<Configuration::SOPServiceConfiguration>(tree);
     readWriteRead<Configuration::Testing::Convention>(tree);
     return 0;
 }

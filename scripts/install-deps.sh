@@ -9,6 +9,7 @@ PACKAGES=(
   libcpp-httplib-dev libhowardhinnant-date-dev
   libgtest-dev libgmock-dev libbenchmark-dev
   clang libclang-rt-14-dev clang-format
+  libdcmtk-dev
   curl wrk etcd-server python3
 )
 
