@@ -1,5 +1,5 @@
 // How HttpConfigurationClient's requests travel: routing to the server, the request as sent,
-// transport failures, time-outs and TLS.
+// transport failures and TLS (time-outs: HttpClientTimeOut_test.cpp).
 #include <gtest/gtest.h>
 #include <netinet/in.h>
 #include <sys/socket.h>
@@ -180,18 +180,6 @@ TEST(HttpClientTransportFailure, ConstructionFailsWhenTheServerCannotAnswer) {
     RefusingPort port;
     EXPECT_THROW(HttpConfigurationClient(port.server().c_str(), false, false),
                  HttpConfigurationTransportException);
-}
-
-TEST(HttpClientTransportFailure, AnAnswerLaterThanTheTimeOutIsNotReceived) {
-    RecordingHttpServer server;
-    ScriptedResponse late = ScriptedResponse::Ok("late");
-    late.delayMilliseconds = 600;
-    server.enqueue(late);
-    HttpTransport::Answer answer;
-    EXPECT_EQ(
-        HttpTransport::Outcome::NotReceived,
-        HttpTransport::post(server.authority().c_str(),
-                            ("http://" + server.authority() + "/").c_str(), "x", {}, 100, answer));
 }
 
 // Sets an environment variable for the life of the object.

@@ -2,6 +2,7 @@
 
 #include <curl/curl.h>
 
+#include <chrono>
 #include <cstdlib>
 #include <string>
 
@@ -89,14 +90,59 @@ void setRoute(CURL* curl, const HttpRoute& route, HeaderList& connectTo) {
     }
 }
 
-void setConnectionPolicy(CURL* curl, long timeoutMs) {
+// Ends an exchange in which no byte of the body went up or came down for longer than the time-out.
+// A large body on a slow link keeps moving, so only a silent peer is cut. libcurl asks about once
+// a second while nothing happens, so the cut comes up to a second after the time-out.
+class StallWatch {
+public:
+    explicit StallWatch(long timeoutMs)
+        : m_timeout(std::chrono::milliseconds(timeoutMs)), m_lastMove(Clock::now()) {}
+
+    // libcurl's progress function: non-zero aborts the transfer.
+    static int onProgress(void* self, curl_off_t, curl_off_t down, curl_off_t, curl_off_t up) {
+        return static_cast<StallWatch*>(self)->stalled(down, up) ? 1 : 0;
+    }
+    // Whether the watch ended the exchange.
+    bool expired() const { return m_expired; }
+
+private:
+    using Clock = std::chrono::steady_clock;
+
+    bool stalled(curl_off_t down, curl_off_t up) {
+        const Clock::time_point now = Clock::now();
+        if (down != m_down || up != m_up) {
+            m_down = down;
+            m_up = up;
+            m_lastMove = now;
+        }
+        m_expired = now - m_lastMove > m_timeout;
+        return m_expired;
+    }
+
+    const Clock::duration m_timeout;
+    Clock::time_point m_lastMove;
+    curl_off_t m_down = 0;
+    curl_off_t m_up = 0;
+    bool m_expired = false;
+};
+
+// A fresh connection for every post, and timeoutMs as the longest silence: first while
+// connecting (TLS handshake included), then between any two bytes of the exchange. A time-out of
+// 0 or less waits without limit.
+void setConnectionPolicy(CURL* curl, long timeoutMs, StallWatch& watch) {
     curl_easy_setopt(curl, CURLOPT_NOSIGNAL, 1L);
     curl_easy_setopt(curl, CURLOPT_PROXY, "");  // never through a proxy from the environment
     curl_easy_setopt(curl, CURLOPT_PROTOCOLS_STR, "http,https");
     curl_easy_setopt(curl, CURLOPT_HTTP_VERSION, static_cast<long>(CURL_HTTP_VERSION_1_1));
     curl_easy_setopt(curl, CURLOPT_FRESH_CONNECT, 1L);
     curl_easy_setopt(curl, CURLOPT_FORBID_REUSE, 1L);
-    curl_easy_setopt(curl, CURLOPT_TIMEOUT_MS, timeoutMs);
+    if (timeoutMs <= 0) {
+        return;
+    }
+    curl_easy_setopt(curl, CURLOPT_CONNECTTIMEOUT_MS, timeoutMs);
+    curl_easy_setopt(curl, CURLOPT_XFERINFOFUNCTION, &StallWatch::onProgress);
+    curl_easy_setopt(curl, CURLOPT_XFERINFODATA, &watch);
+    curl_easy_setopt(curl, CURLOPT_NOPROGRESS, 0L);
 }
 
 HttpTransport::Outcome failure(CURL* curl, CURLcode result, const char* detail,
@@ -123,7 +169,8 @@ HttpTransport::Outcome HttpTransport::post(const ACE_CString& server, const ACE_
     const HttpRoute route = RouteRequest(server.c_str(), std::string(url.c_str(), url.length()));
     HeaderList connectTo;
     setRoute(curl, route, connectTo);
-    setConnectionPolicy(curl, timeoutMs);
+    StallWatch watch(timeoutMs);
+    setConnectionPolicy(curl, timeoutMs, watch);
 
     HeaderList headers;
     setHeaders(headers, body.length());
@@ -144,7 +191,8 @@ HttpTransport::Outcome HttpTransport::post(const ACE_CString& server, const ACE_
 
     const CURLcode result = curl_easy_perform(curl);
     if (result != CURLE_OK) {
-        return failure(curl, result, error, route.url);
+        return failure(curl, result, watch.expired() ? "no progress within the time-out" : error,
+                       route.url);
     }
     long status = 0;
     curl_easy_getinfo(curl, CURLINFO_RESPONSE_CODE, &status);

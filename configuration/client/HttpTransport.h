@@ -1,7 +1,10 @@
 // HttpTransport: the one HTTP exchange of HttpConfigurationClient, over libcurl. Every post uses a
 // fresh easy handle and a fresh connection (nothing is reused), is routed by HttpRoute to the
 // client's server, sends the cookies in key order in one Cookie header and an explicit
-// Content-Length, and waits at most the given number of milliseconds.
+// Content-Length. The time-out bounds silence, not the whole exchange: connecting may take at
+// most that long, and afterwards the exchange is ended only when no byte went up or came down for
+// longer than that (checked about once a second), so a large body on a slow link is not cut
+// while it still moves.
 //
 // TLS peers are verified against the system's certificate store, or against the PEM bundle named
 // by the environment variable QUORVEX_CA_FILE when it is set (for private certificate
@@ -32,7 +35,8 @@ public:
     // Environment variable naming a CA bundle to verify TLS peers against.
     static constexpr const char* CA_FILE_VARIABLE = "QUORVEX_CA_FILE";
 
-    // POSTs body to url over a new connection to server; fills answer when Answered.
+    // POSTs body to url over a new connection to server; fills answer when Answered. timeoutMs is
+    // the longest silence allowed (0 or less: no limit).
     static Outcome post(const ACE_CString& server, const ACE_CString& url, const ACE_CString& body,
                         const CookieMap& cookies, long timeoutMs, Answer& answer);
 };

@@ -5,6 +5,10 @@
 // status and error record; every failure reaches the caller as an HttpConfigurationException (or,
 // where documented, a plain std::exception).
 //
+// Time-out: a call gives up when the server stays silent for 35 s, while connecting or while
+// waiting for the answer. It is not a limit on the whole exchange: a large document on a slow
+// link takes as long as it needs as long as bytes keep moving.
+//
 // Ownership and threads: a client is a plain value (copyable) that keeps no connection state; it
 // holds no lock of its own and its operations only read its fields, so one client per thread (or a
 // const client shared) is safe. The two process-wide host-name caches are shared by all clients:
@@ -143,7 +147,7 @@ private:
     ACE_CString m_hostName;
     ACE_CString m_masterHostName;
     ACE_CString m_server;
-    int m_receiveTimeout;
+    int m_receiveTimeout;  // ms of silence after which a call gives up (35000)
     CookieMap m_cookies;
 
     static HostNameMap m_mapConfigurationServiceHostName;
