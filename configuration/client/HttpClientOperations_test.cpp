@@ -108,14 +108,19 @@ TEST_F(HttpClientOperations, EachOperationSendsItsExactBody) {
     }
 }
 
+// As written by the service, and wrapped in lines (also with the line ends as character
+// references) as some services and proxies send it.
 TEST_F(HttpClientOperations, RetrieveDecodesTheDocument) {
     const HttpConfigurationClient client = makeClient();
-    answerNext(LegacyOk("<Configuration>YWJjAP8=</Configuration>"));
-    Quorvex::ByteArray data;
-    std::size_t length = 0;
-    client.retrieve("h1", "DicomScp", data, length);
-    ASSERT_EQ(sizeof DATA, length);
-    EXPECT_EQ(0, std::memcmp(DATA, data.get(), length));
+    for (const char* encoded :
+         {"YWJjAP8=", "YWJj\r\nAP8=\r\n", "\n  YWJj\n  AP8=\n", "YWJj&#13;&#10;AP8=&#xD;&#xA;"}) {
+        answerNext(LegacyOk(std::string("<Configuration>") + encoded + "</Configuration>"));
+        Quorvex::ByteArray data;
+        std::size_t length = 0;
+        client.retrieve("h1", "DicomScp", data, length);
+        ASSERT_EQ(sizeof DATA, length) << encoded;
+        EXPECT_EQ(0, std::memcmp(DATA, data.get(), length)) << encoded;
+    }
 }
 
 TEST_F(HttpClientOperations, RetrieveAllConfigurationsReturnsTheWholeAnswer) {

@@ -1,5 +1,5 @@
-// Base64Coder: standard Base64 (RFC 4648 alphabet, '=' padding, no line breaks). Stateless and
-// thread-safe.
+// Base64Coder: standard Base64 (RFC 4648 alphabet, '=' padding). Encode writes one line without
+// breaks; Decode also reads text wrapped in lines or spaced out. Stateless and thread-safe.
 #pragma once
 
 #include <ace/SString.h>
@@ -12,8 +12,10 @@ class Base64Coder {
 public:
     // The Base64 text of len bytes.
     static ACE_CString Encode(const unsigned char* data, std::size_t len);
-    // Decodes text; the caller owns the bytes (length in outLen). Characters outside the
-    // alphabet, bad padding or a length that is not a multiple of four throw std::invalid_argument.
+    // Decodes text; the caller owns the bytes (length in outLen). Spaces, tabs, CR and LF are
+    // skipped wherever they stand; any other character outside the alphabet, bad padding or a
+    // count of the other characters that is not a multiple of four throw std::invalid_argument
+    // (the message gives the offset in text as given).
     static Quorvex::ByteArray Decode(const char* text, std::size_t len, std::size_t& outLen);
     static Quorvex::ByteArray Decode(const ACE_CString& text, std::size_t& outLen) {
         return Decode(text.c_str(), text.length(), outLen);

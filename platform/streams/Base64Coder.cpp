@@ -1,10 +1,13 @@
-// Table-driven Base64: three bytes become four characters. Decoding is strict so that every
-// accepted text is exactly what Encode would write for its bytes.
+// Table-driven Base64: three bytes become four characters. Decoding skips blanks and line breaks
+// (wrapped answers) and is strict about everything else, so that every accepted text, without its
+// blanks, is exactly what Encode would write for its bytes.
 #include "Quorvex/Base64Coder.h"
 
+#include <algorithm>
 #include <array>
 #include <cstdint>
 #include <cstdio>
+#include <iterator>
 #include <stdexcept>
 #include <string>
 
@@ -28,19 +31,70 @@ constexpr DecodeTable makeDecodeTable() {
 
 constexpr DecodeTable kDecode = makeDecodeTable();
 
+// ASCII blanks and line breaks, which wrapped Base64 carries between its characters.
+bool isBlank(char c) {
+    return c == ' ' || c == '\t' || c == '\r' || c == '\n';
+}
+
+// The text being decoded without its blanks, and where each of its characters stood in the text
+// as given, so that errors name the offset the caller sees.
+class Significant {
+public:
+    Significant(const char* text, std::size_t len) : m_given(text), m_givenLength(len) {
+        if (std::find_if(text, text + len, isBlank) == text + len) {
+            m_text = text;
+            m_length = len;
+            return;
+        }
+        m_compact.reserve(len);
+        std::remove_copy_if(text, text + len, std::back_inserter(m_compact), isBlank);
+        m_text = m_compact.data();
+        m_length = m_compact.size();
+    }
+    Significant(const Significant&) = delete;
+    Significant& operator=(const Significant&) = delete;
+
+    const char* text() const { return m_text; }
+    std::size_t length() const { return m_length; }
+    bool hadBlanks() const { return m_text != m_given; }
+
+    // The offset in the given text of the i-th significant character.
+    std::size_t givenOffset(std::size_t i) const {
+        if (!hadBlanks()) {
+            return i;
+        }
+        std::size_t at = 0;
+        for (std::size_t seen = 0; at < m_givenLength; ++at) {
+            if (!isBlank(m_given[at]) && seen++ == i) {
+                break;
+            }
+        }
+        return at;
+    }
+
+private:
+    const char* m_given;
+    std::size_t m_givenLength;
+    std::string m_compact;
+    const char* m_text = nullptr;
+    std::size_t m_length = 0;
+};
+
 [[noreturn]] void reject(const std::string& why, std::size_t offset) {
     throw std::invalid_argument("Base64Coder::Decode: " + why + " at offset " +
                                 std::to_string(offset));
 }
 
-// The 6-bit value of text[i]; anything outside the alphabet (also '=') is rejected.
-std::uint32_t sextet(const char* text, std::size_t i) {
-    const std::uint8_t v = kDecode[static_cast<unsigned char>(text[i])];
+// The 6-bit value of the i-th significant character; anything outside the alphabet (also '=') is
+// rejected.
+std::uint32_t sextet(const Significant& in, std::size_t i) {
+    const char c = in.text()[i];
+    const std::uint8_t v = kDecode[static_cast<unsigned char>(c)];
     if (v == kInvalid) {
         char shown[8];
-        std::snprintf(shown, sizeof shown, "0x%02X", static_cast<unsigned char>(text[i]));
-        reject(std::string(text[i] == '=' ? "misplaced padding " : "invalid character ") + shown,
-               i);
+        std::snprintf(shown, sizeof shown, "0x%02X", static_cast<unsigned char>(c));
+        reject(std::string(c == '=' ? "misplaced padding " : "invalid character ") + shown,
+               in.givenOffset(i));
     }
     return v;
 }
@@ -78,9 +132,14 @@ ACE_CString Base64Coder::Encode(const unsigned char* data, std::size_t len) {
     return ACE_CString(out.data(), out.size());
 }
 
-Quorvex::ByteArray Base64Coder::Decode(const char* text, std::size_t len, std::size_t& outLen) {
+Quorvex::ByteArray Base64Coder::Decode(const char* given, std::size_t givenLength,
+                                       std::size_t& outLen) {
+    const Significant in(given, givenLength);
+    const char* text = in.text();
+    const std::size_t len = in.length();
     if (len % 4 != 0) {
         throw std::invalid_argument("Base64Coder::Decode: length " + std::to_string(len) +
+                                    (in.hadBlanks() ? " without blanks" : "") +
                                     " is not a multiple of 4");
     }
     const std::size_t pad = paddingOf(text, len);
@@ -88,13 +147,13 @@ Quorvex::ByteArray Base64Coder::Decode(const char* text, std::size_t len, std::s
     outLen = len / 4 * 3 - pad;
     Quorvex::ByteArray bytes(new unsigned char[outLen]);
     unsigned char* o = bytes.get();
-    const auto* in = reinterpret_cast<const unsigned char*>(text);
+    const auto* u = reinterpret_cast<const unsigned char*>(text);
     for (std::size_t i = 0; i < full; i += 4, o += 3) {
-        const std::uint8_t a = kDecode[in[i]], b = kDecode[in[i + 1]], c = kDecode[in[i + 2]],
-                           d = kDecode[in[i + 3]];
+        const std::uint8_t a = kDecode[u[i]], b = kDecode[u[i + 1]], c = kDecode[u[i + 2]],
+                           d = kDecode[u[i + 3]];
         if (((a | b | c | d) & 0x80) != 0) {
             for (std::size_t k = i; k < i + 4; ++k) {
-                sextet(text, k);  // throws for the first bad character
+                sextet(in, k);  // throws for the first bad character
             }
         }
         const std::uint32_t v = (std::uint32_t{a} << 18) | (b << 12) | (c << 6) | d;
@@ -104,12 +163,12 @@ Quorvex::ByteArray Base64Coder::Decode(const char* text, std::size_t len, std::s
     }
     if (pad > 0) {
         const std::size_t i = full;
-        std::uint32_t v = (sextet(text, i) << 18) | (sextet(text, i + 1) << 12);
+        std::uint32_t v = (sextet(in, i) << 18) | (sextet(in, i + 1) << 12);
         if (pad == 1) {
-            v |= sextet(text, i + 2) << 6;
+            v |= sextet(in, i + 2) << 6;
         }
         if ((v & (pad == 1 ? 0xFFu : 0xFFFFu)) != 0) {
-            reject("non-zero bits before the padding", i + 3 - pad);
+            reject("non-zero bits before the padding", in.givenOffset(i + 3 - pad));
         }
         o[0] = static_cast<unsigned char>(v >> 16);
         if (pad == 1) {

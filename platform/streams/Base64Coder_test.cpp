@@ -50,15 +50,35 @@ TEST(Base64Coder, RandomRoundTrips) {
     }
 }
 
-// Lengths not a multiple of 4; whitespace and line breaks; characters outside the alphabet and
-// NUL; misplaced padding; bits set under the padding.
+// Wrapped or spaced-out text, as some services and proxies send it: the blanks and line breaks go,
+// wherever they stand, even inside the padding.
+TEST(Base64Coder, SkipsBlanksAndLineBreaks) {
+    using namespace std::string_literals;
+    const std::pair<std::string, std::string> cases[] = {{"Zm9v\n", "foo"},
+                                                         {"Zm9v\r\nYmFy\r\n", "foobar"},
+                                                         {" Zm9v", "foo"},
+                                                         {"Zm 9v", "foo"},
+                                                         {"Zm9v\t", "foo"},
+                                                         {"Zm9vYg\n==", "foob"},
+                                                         {"Zm9vYmE\r\n=", "fooba"},
+                                                         {"Zg=\n=", "f"},
+                                                         {" \t\r\n", ""},
+                                                         {"\n\nZ m 9 v Y m F y\n\n", "foobar"},
+                                                         {"AAAA\nAAAA"s, "\0\0\0\0\0\0"s}};
+    for (const auto& c : cases) {
+        EXPECT_EQ(c.second, decode(c.first)) << c.first;
+    }
+}
+
+// Lengths not a multiple of 4 (blanks not counted); characters outside the alphabet, other
+// control characters and NUL; misplaced padding; bits set under the padding.
 TEST(Base64Coder, RejectsEveryKindOfInvalidText) {
     using namespace std::string_literals;
     for (const std::string& text :
-         {"Z"s,          "Zg"s,    "Zg="s,    "Zm9vY"s, "Zm9v\n"s, "Zm9v\r\nYmFy"s,
-          " Zm9v"s,      "Zm 9v"s, "Zm9v\t"s, "Zm-v"s,  "Zm_v"s,   "Zm9."s,
-          "Z\xC3\xA9v"s, "Zm\0v"s, "=Zm9"s,   "Z=m9"s,  "Zm=v"s,   "Zg==Zg=="s,
-          "Z==="s,       "===="s,  "Zh=="s,   "Zm9="s}) {
+         {"Z"s,          "Zg"s,     "Zg="s,     "Zm9vY"s, "Zm9\nvY"s, "Z g"s,
+          "Zm9v\v"s,     "Zm9v\f"s, "Zm\xA0v"s, "Zm-v"s,  "Zm_v"s,    "Zm9."s,
+          "Z\xC3\xA9v"s, "Zm\0v"s,  "=Zm9"s,    "Z=m9"s,  "Zm=v"s,    "Zg==Zg=="s,
+          "Zg==\nZg=="s, "Z==="s,   "===="s,    "Zh=="s,  "Zm9="s,    "Zh\r\n=="s}) {
         std::size_t len = 0;
         try {
             Base64Coder::Decode(text.data(), text.size(), len);
@@ -69,13 +89,23 @@ TEST(Base64Coder, RejectsEveryKindOfInvalidText) {
     }
 }
 
+// Offsets are those of the text as given, blanks counted.
 TEST(Base64Coder, ErrorNamesTheOffendingCharacter) {
-    std::size_t len = 0;
-    try {
-        Base64Coder::Decode("Zm9vYm E", 8, len);
-        FAIL() << "no exception";
-    } catch (const std::invalid_argument& e) {
-        EXPECT_STREQ("Base64Coder::Decode: invalid character 0x20 at offset 6", e.what());
+    const std::pair<std::string, std::string> cases[] = {
+        {"Zm9vYm-E", "invalid character 0x2D at offset 6"},
+        {"Zm9v\r\nYm-E", "invalid character 0x2D at offset 8"},
+        {"Zm9v\r\nY=mE", "misplaced padding 0x3D at offset 7"},
+        {"Zm9v\r\nZh\r\n==", "non-zero bits before the padding at offset 7"},
+        {"Zm9vYmE", "length 7 is not a multiple of 4"},
+        {"Zm9vYm E", "length 7 without blanks is not a multiple of 4"}};
+    for (const auto& c : cases) {
+        std::size_t len = 0;
+        try {
+            Base64Coder::Decode(c.first.data(), c.first.size(), len);
+            ADD_FAILURE() << "accepted " << c.first;
+        } catch (const std::invalid_argument& e) {
+            EXPECT_EQ("Base64Coder::Decode: " + c.second, e.what());
+        }
     }
 }
 
