@@ -24,7 +24,7 @@ std::string HostKey(const std::string& host);
 std::vector<ACE_CString> GetLogicalDriveList();
 // The full path of the running executable.
 ACE_CString GetExecutablePath();
-// Whether this machine is a failover-cluster node.
+// Whether this machine is a failover-cluster node (on Linux: see Quorvex::Machine).
 bool IsClusterNode();
 // An environment variable's value; false when it is not set.
 bool GetEnvironmentVariable(const char* name, ACE_CString& value);

@@ -5,6 +5,7 @@
 #include <ifaddrs.h>
 #include <netdb.h>
 #include <netinet/in.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 #include <atomic>
@@ -12,6 +13,7 @@
 #include <climits>
 #include <cstdlib>
 #include <cstring>
+#include <utility>
 
 namespace Quorvex {
 namespace {
@@ -39,7 +41,27 @@ ACE_CString canonicalName(const char* shortName) {
     return name;
 }
 
+// path under root, with one slash between them.
+std::string underRoot(const std::string& root, const char* path) {
+    if (!root.empty() && root.back() == '/') {
+        return root + path;
+    }
+    return root + "/" + path;
+}
+
+bool isFile(const std::string& path) {
+    struct stat info {};
+    return stat(path.c_str(), &info) == 0 && S_ISREG(info.st_mode);
+}
+
 }  // namespace
+
+// The cluster stack's own configuration and the cluster information base it keeps once a cluster
+// has been formed; either shows that this machine was set up as a node.
+const char* const Machine::CLUSTER_CONFIGURATION_FILES[2] = {"etc/corosync/corosync.conf",
+                                                             "var/lib/pacemaker/cib/cib.xml"};
+
+Machine::Machine(std::string systemRoot) : m_systemRoot(std::move(systemRoot)) {}
 
 ACE_CString Machine::hostName(bool fullyQualified) const {
     char buf[HOST_NAME_MAX + 1] = {};
@@ -90,6 +112,16 @@ ACE_CString Machine::executablePath() const {
 }
 
 bool Machine::isClusterNode() const {
+    ACE_CString overridden;
+    if (environment(CLUSTER_NODE_VARIABLE, overridden) &&
+        (overridden == "1" || overridden == "0")) {
+        return overridden == "1";
+    }
+    for (const char* file : CLUSTER_CONFIGURATION_FILES) {
+        if (isFile(underRoot(m_systemRoot, file))) {
+            return true;
+        }
+    }
     return false;
 }
 
