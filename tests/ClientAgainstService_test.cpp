@@ -45,7 +45,8 @@ TEST_F(ClientAgainstService, KnowsTheServiceAndItsMaster) {
 
 TEST_F(ClientAgainstService, StoreRetrieveExistsAndTimeStamp) {
     const std::string bytes("\0\x01\xfe\xff binary", 11);
-    store("Orvel1", "BrimmetServer\\Location", bytes, "2010-03-04T05:06:07.089");
+    // The service's own time form, with its seven digits and zone, is taken as the time it says.
+    store("Orvel1", "BrimmetServer\\Location", bytes, "2010-03-04T05:06:07.0890000-00:00");
     Quorvex::ByteArray data;
     std::size_t length = 0;
     client.retrieve("ORVEL1", "BrimmetServer\\Location", data, length);
@@ -109,13 +110,17 @@ TEST_F(ClientAgainstService, ListItemsOfOneHostAndOfAll) {
     client.listItems("A", items);
     ASSERT_EQ(items.size(), 1u);
     EXPECT_EQ(items[0].configurationName, "One");
+    EXPECT_EQ(items[0].host, "a");  // the host as it was stored
     EXPECT_TRUE(BDateTime(items[0].lastModifiedTime).isValid());
     client.listItems("*", items);
     EXPECT_EQ(items.size(), 2u);
+    client.listItems("c", items);
+    EXPECT_TRUE(items.empty());
 }
 
 TEST_F(ClientAgainstService, RegisteredServicesMakeTheHostList) {
     client.registerService("Slave1", "Storage", "ModuleType=7;Port=104");
+    client.registerService("SLAVE1", "Query", "ModuleType=8");  // one host, whatever the case
     client.registerService(client.hostName(), "Query", "ModuleType=8");
     std::vector<ACE_CString> hosts;
     client.listHosts(hosts);
@@ -142,6 +147,7 @@ TEST_F(ClientAgainstService, ServerInformationIsAnElementTree) {
     Vesk::Element info;
     Vesk::XmlUtils::parse(text.c_str(), text.length(), info);
     EXPECT_EQ(info.getMultiElement().getElement("HostName").getSingle().value(), "TestHost");
+    EXPECT_EQ(info.getMultiElement().getElement("IsMaster").getSingle().value(), "1");
 }
 
 TEST_F(ClientAgainstService, SignalsSetTheMachineEvent) {

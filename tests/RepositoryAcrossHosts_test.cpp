@@ -185,17 +185,6 @@ TEST_F(Site, CacheMasterWebToLocalWebCopiesExactlyWhatIsMissingOrChanged) {
     EXPECT_TRUE(onMaster.empty());
 }
 
-TEST_F(Site, CacheMasterWebToLocalWebOnTheMasterCopiesNothing) {
-    ScopedEnv events("QUORVEX_EVENT_DIR", scratch.file("master-events"));
-    auto repository = repositoryOn(master);
-    std::vector<_HttpConfigurationItemInfo> before;
-    client(master).listItems("*", before);
-    EXPECT_EQ(repository->CacheMasterWebToLocalWeb(), 0);
-    std::vector<_HttpConfigurationItemInfo> after;
-    client(master).listItems("*", after);
-    EXPECT_EQ(after.size(), before.size());
-}
-
 TEST_F(Site, TheMasterHostComesFromTheMachinesSystemDocument) {
     IntegrationTesting::ChildProcess probe({REPOSITORY_PROBE_BINARY, "Shared", "never", "300"},
                                            probeEnvironment(slave2, "slave2"));
