@@ -2,6 +2,7 @@
 
 #include <stdexcept>
 #include <string>
+#include <utility>
 
 #include "Configuration/StoredForm.h"
 
@@ -22,7 +23,8 @@ Quorvex::auto_ptr<Vesk::Element> writeItem(const ACE_CString& name, ConfigDoc& d
     return tree;
 }
 
-int readItem(const ACE_CString& name, ConfigDoc& document, const RetrieveFunction& retrieve) {
+int readItem(const ACE_CString& name, ConfigDoc& document, const RetrieveFunction& retrieve,
+             Vesk::Element* treeOut) {
     Quorvex::ByteArray bytes;
     std::size_t length = 0;
     BDateTime stored;
@@ -31,13 +33,20 @@ int readItem(const ACE_CString& name, ConfigDoc& document, const RetrieveFunctio
     }
     Vesk::Element tree(ACE_CString(), -1);
     StoredForm::decode(bytes.get(), length, tree);
+    readTree(tree, document);
+    document.timestamp(stored);
+    if (treeOut != nullptr) {
+        *treeOut = std::move(tree);
+    }
+    return 0;
+}
+
+void readTree(const Vesk::Element& tree, ConfigDoc& document) {
     if (!document.readVesk(tree)) {
         throw std::runtime_error(std::string("ConfigurationRepository::ReadItem: Error parsing "
                                              "configuration: ") +
                                  document.path().c_str() + "\n");
     }
-    document.timestamp(stored);
-    return 0;
 }
 
 }  // namespace DocumentCodec

@@ -5,7 +5,8 @@
 // timestamp to store; returns the tree when store reports 0, else null. The new timestamp stays
 // on the document even when the store fails: callers do not roll it back.
 // readItem: retrieve bytes and timestamp (non-zero result: -1), decode, readVesk; returns 0 and
-// sets the stored timestamp when every key was read, and throws std::runtime_error
+// sets the stored timestamp when every key was read (and hands the decoded tree to treeOut when
+// given), and throws std::runtime_error
 // "ConfigurationRepository::ReadItem: Error parsing configuration: <path>\n" when one was missing.
 // Decode failures pass on as their own exceptions. Stateless; thread-safe for distinct documents.
 #pragma once
@@ -32,7 +33,11 @@ using RetrieveFunction =
 
 Quorvex::auto_ptr<Vesk::Element> writeItem(const ACE_CString& name, ConfigDoc& document,
                                            const StoreFunction& store);
-int readItem(const ACE_CString& name, ConfigDoc& document, const RetrieveFunction& retrieve);
+int readItem(const ACE_CString& name, ConfigDoc& document, const RetrieveFunction& retrieve,
+             Vesk::Element* treeOut = nullptr);
+// readVesk of a decoded tree into document; the "Error parsing configuration" std::runtime_error
+// when a key was missing.
+void readTree(const Vesk::Element& tree, ConfigDoc& document);
 
 }  // namespace DocumentCodec
 }  // namespace Configuration

@@ -14,6 +14,7 @@
 #include "Quorvex/Host.h"
 #include "Quorvex/Log.h"
 #include "model/DocumentCodec.h"
+#include "repository/CachedDocument.h"
 #include "repository/HttpServiceConnection.h"
 #include "repository/MasterSource.h"
 #include "repository/StoreServiceConnection.h"
@@ -33,6 +34,17 @@ std::shared_ptr<ServiceConnector> connectorFromEnvironment() {
     return std::make_shared<HttpServiceConnector>(std::move(location));
 }
 
+// The object manager's singleton lock. ACE keeps the lock it hands out in the pointer passed to
+// it, so that pointer must be one for the whole process: a fresh null pointer per call would get
+// a fresh mutex per call. The static's own initialisation is thread-safe.
+ACE_Thread_Mutex* singletonLock() {
+    static ACE_Thread_Mutex* const lock = [] {
+        ACE_Thread_Mutex* acquired = nullptr;
+        return ACE_Object_Manager::get_singleton_lock(acquired) == 0 ? acquired : nullptr;
+    }();
+    return lock;
+}
+
 }  // namespace
 
 ConfigurationRepository* ConfigurationRepository::instance() {
@@ -40,8 +52,8 @@ ConfigurationRepository* ConfigurationRepository::instance() {
     if (repository != nullptr) {
         return repository;
     }
-    ACE_Thread_Mutex* lock = nullptr;
-    if (ACE_Object_Manager::get_singleton_lock(lock) != 0 || lock == nullptr) {
+    ACE_Thread_Mutex* lock = singletonLock();
+    if (lock == nullptr) {
         throw std::runtime_error("ConfigurationRepository::instance() lock acquire failed");
     }
     ACE_Guard<ACE_Thread_Mutex> guard(*lock);
@@ -96,11 +108,7 @@ ACE_CString ConfigurationRepository::hostFor(const ConfigDoc& document) const {
 
 int ConfigurationRepository::GetLatest(ConfigDoc& document, bool force) {
     try {
-        ACE_Guard<ACE_Thread_Mutex> guard(m_cacheLock);
-        ConfigDoc& latest = GetLatest_i(document, force);
-        if (&latest != &document) {
-            document.assignFrom(latest);
-        }
+        GetLatest_i(document, force);
         return 0;
     } catch (const std::exception& e) {
         QUORVEX_LOG(LM_ERROR,
@@ -111,58 +119,101 @@ int ConfigurationRepository::GetLatest(ConfigDoc& document, bool force) {
     }
 }
 
-// Called with the cache lock held.
-ConfigDoc& ConfigurationRepository::GetLatest_i(ConfigDoc& document, bool force) {
-    const ACE_CString host = hostFor(document);
-    const auto found = m_cache.find(document.path());
-    if (found == m_cache.end()) {
-        if (ReadItem(host, document) != 0) {
-            throw std::runtime_error("ConfigurationRepository: Unable to read configuration");
+// The cache lock is held only to look an entry up and to swap one in: the requests to the store
+// run outside it, so a slow or dead service never stalls other threads' cached reads.
+void ConfigurationRepository::GetLatest_i(ConfigDoc& document, bool force) {
+    ACE_CString host;
+    std::shared_ptr<const CachedDocument> entry;
+    bool check = false;
+    {
+        ACE_Guard<ACE_Thread_Mutex> guard(m_cacheLock);
+        host = hostFor(document);
+        const auto found = m_cache.find(document.path());
+        if (found != m_cache.end()) {
+            entry = found->second;
+            const BDateTime now = BDateTime::Now();
+            check = force || now > m_nextCheck;
+            if (check) {
+                m_nextCheck = now + BTime(0, 5, 0);
+            }
         }
-        m_cache.emplace(document.path(), std::unique_ptr<ConfigDoc>(document.clone()));
-        return document;
     }
-    ConfigDoc& cached = *found->second;
-    const BDateTime now = BDateTime::Now();
-    if (!force && !(now > m_nextCheck)) {
-        return cached;
+    if (!entry || check) {
+        auto fetched = fetch(host, document, entry);
+        keep(document.path(), entry, fetched);
+        entry = std::move(fetched);
     }
-    m_nextCheck = now + BTime(0, 5, 0);
-    BDateTime stored;
-    if (GetConfigItemTimeStamp(host, cached.path(), stored) != 0) {
-        throw std::runtime_error("ConfigurationRepository: Unable to get timestamp");
+    const ConfigDoc* copy = entry->copyOf(document);
+    if (copy == nullptr) {  // another class of the same document was read first
+        auto wider = entry->withCopyOf(document);
+        keep(document.path(), entry, wider);
+        entry = std::move(wider);
+        copy = entry->copyOf(document);
     }
-    if (stored != cached.timestamp()) {
-        // Read into a copy, so that a failed read leaves the cached document whole.
-        std::unique_ptr<ConfigDoc> fresh(cached.clone());
-        if (ReadItem(host, *fresh) != 0) {
-            throw std::runtime_error("ConfigurationRepository: Unable to read configuration");
+    document.assignFrom(*copy);
+}
+
+// The latest state of document's path as an entry: cached unchanged when the store's timestamp
+// is the cached one, else read afresh into a copy, so that a failed read leaves both the cache
+// and the caller's document whole.
+std::shared_ptr<const CachedDocument> ConfigurationRepository::fetch(
+    const ACE_CString& host, const ConfigDoc& document,
+    const std::shared_ptr<const CachedDocument>& cached) {
+    const ConfigDoc* base = &document;
+    if (cached) {
+        BDateTime stored;
+        if (GetConfigItemTimeStamp(host, document.path(), stored) != 0) {
+            throw std::runtime_error("ConfigurationRepository: Unable to get timestamp");
         }
-        fresh->timestamp(stored);
-        cached.assignFrom(*fresh);
+        if (stored == cached->timestamp()) {
+            return cached;
+        }
+        if (const ConfigDoc* copy = cached->copyOf(document)) {
+            base = copy;
+        }
     }
-    return cached;
+    std::unique_ptr<ConfigDoc> fresh(base->clone());
+    auto tree = std::make_shared<Vesk::Element>(ACE_CString(), -1);
+    if (ReadItem(host, *fresh, *tree) != 0) {
+        throw std::runtime_error("ConfigurationRepository: Unable to read configuration");
+    }
+    return std::make_shared<const CachedDocument>(std::move(tree), *fresh);
+}
+
+// Puts entry in the cache in place of expected. When another thread has replaced expected in the
+// meantime, its entry is at least as new and stays.
+void ConfigurationRepository::keep(const ACE_CString& path,
+                                   const std::shared_ptr<const CachedDocument>& expected,
+                                   const std::shared_ptr<const CachedDocument>& entry) {
+    ACE_Guard<ACE_Thread_Mutex> guard(m_cacheLock);
+    std::shared_ptr<const CachedDocument>& slot = m_cache[path];
+    if (slot == expected) {
+        slot = entry;
+    }
 }
 
 int ConfigurationRepository::Store(ConfigDoc& document) {
     const ACE_CString host = document.isLocal() ? m_virtualHostName : GetMasterHostName();
-    if (!WriteItem(host, document)) {
+    Quorvex::auto_ptr<Vesk::Element> tree = WriteItem(host, document);
+    if (!tree) {
         return -1;
     }
+    auto entry = std::make_shared<const CachedDocument>(
+        std::shared_ptr<const Vesk::Element>(tree.release()), document);
     ACE_Guard<ACE_Thread_Mutex> guard(m_cacheLock);
-    std::unique_ptr<ConfigDoc>& cached = m_cache[document.path()];
-    cached.reset(document.clone());
+    m_cache[document.path()] = std::move(entry);
     return 0;
 }
 
-int ConfigurationRepository::ReadItem(const ACE_CString& name, ConfigDoc& document) {
+int ConfigurationRepository::ReadItem(const ACE_CString& name, ConfigDoc& document,
+                                      Vesk::Element& tree) {
     try {
         return DocumentCodec::readItem(
             name, document,
             [this](const ACE_CString& host, const ACE_CString& path, Quorvex::ByteArray& bytes,
-                   std::size_t& length, BDateTime& timestamp) {
-                return Retrieve(host, path, bytes, length, timestamp);
-            });
+                   std::size_t& length,
+                   BDateTime& timestamp) { return Retrieve(host, path, bytes, length, timestamp); },
+            &tree);
     } catch (const std::exception& e) {
         QUORVEX_LOG(LM_ERROR,
                     "ConfigurationRepository::ReadItem: Error reading configuration item %s. "
@@ -190,10 +241,10 @@ int ConfigurationRepository::GetConfigCacheItemInfo(const ACE_CString& path,
 int ConfigurationRepository::cacheItemInfo(const ACE_CString& path,
                                            ConfigCacheItemInfo& info) const {
     const auto found = m_cache.find(path);
-    if (found == m_cache.end()) {
+    if (found == m_cache.end() || !found->second) {
         return -1;
     }
-    const ConfigDoc& cached = *found->second;
+    const ConfigDoc& cached = found->second->any();
     info.isLocal = cached.isLocal();
     info.version = cached.version();
     info.isLocked = cached.isLocked();
@@ -201,14 +252,21 @@ int ConfigurationRepository::cacheItemInfo(const ACE_CString& path,
     return 0;
 }
 
+// Checks every cached document against the store, each outside the cache lock.
 int ConfigurationRepository::RefreshCache() {
-    ACE_Guard<ACE_Thread_Mutex> guard(m_cacheLock);
-    try {
-        for (auto& entry : m_cache) {
-            ConfigCacheItemInfo info;
-            if (cacheItemInfo(entry.first, info) == 0) {
-                GetLatest_i(*entry.second, true);
+    std::vector<std::shared_ptr<const CachedDocument>> entries;
+    {
+        ACE_Guard<ACE_Thread_Mutex> guard(m_cacheLock);
+        for (const auto& entry : m_cache) {
+            if (entry.second) {
+                entries.push_back(entry.second);
             }
+        }
+    }
+    try {
+        for (const auto& entry : entries) {
+            std::unique_ptr<ConfigDoc> document(entry->any().clone());
+            GetLatest_i(*document, true);
         }
         return 0;
     } catch (const std::exception& e) {

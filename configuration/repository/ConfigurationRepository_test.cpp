@@ -137,6 +137,40 @@ TEST_F(RepositoryTest, UnreadableDocumentGivesMinusOneAndKeepsDefaults) {
     EXPECT_TRUE(log.containsFragment("ConfigurationRepository: Unable to read configuration"));
 }
 
+// A second class of the stored document "TestDoc" that reads only its name.
+class NameOnly : public TypedConfigDoc<NameOnly> {
+public:
+    NameOnly() : TypedConfigDoc(ConfigDoc::getConfigurationRegistryPath() + "TestDoc", false) {}
+    bool readVesk(const Vesk::Element& e) override {
+        return Fields::read(*this, e, "NameOnly", Fields::FailureForm::Failed);
+    }
+    Quorvex::auto_ptr<Vesk::Element> writeVesk() const override {
+        return Fields::write(*this, "TestDoc");
+    }
+    ACE_CString name;
+
+private:
+    friend struct Fields::Access;
+    template <class Self, class Io>
+    static void fields(Self& s, Io& io) {
+        io("Name", s.name);
+    }
+};
+
+// Guards against the cache keeping only the first class's copy: a second class of the same
+// document got std::bad_cast and -1.
+TEST_F(RepositoryTest, ClassesNamingTheSameDocumentAreAllServedFromTheCache) {
+    TestDocument whole;
+    ASSERT_EQ(repository->GetLatest(whole), 0);
+    NameOnly name;
+    ASSERT_EQ(repository->GetLatest(name), 0);
+    EXPECT_EQ(name.name, "first");
+    EXPECT_EQ(name.timestamp(), whole.timestamp());
+    ASSERT_EQ(repository->GetLatest(whole), 0);  // the first class is still served its own copy
+    EXPECT_EQ(whole.size, 1u);
+    EXPECT_EQ(local.retrieves, 1);
+}
+
 TEST_F(RepositoryTest, DocumentMissingAKeyIsAnErrorAndNotCached) {
     Vesk::Element partial("TestDoc", -1);
     partial.addMultiElement().addElement("Name", {}, -1).addSingle().assign("only");

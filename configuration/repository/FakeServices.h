@@ -6,6 +6,7 @@
 #include <ace/OS_NS_strings.h>
 
 #include <atomic>
+#include <condition_variable>
 #include <cstring>
 #include <map>
 #include <mutex>
@@ -29,6 +30,30 @@ struct FakeService {
     std::mutex mutex;  // guards items and registrations
     std::atomic<int> retrieves{0}, timestamps{0}, stores{0}, changed{0}, refreshes{0}, restarts{0};
     std::vector<std::string> registrations;
+    std::mutex gateMutex;  // guards stalled
+    std::condition_variable gate;
+    bool stalled = false;
+    std::atomic<int> waiting{0};  // requests held by a stall so far
+
+    // While stalled, timestamp requests wait as on a service that does not answer.
+    void stall() {
+        std::lock_guard<std::mutex> guard(gateMutex);
+        stalled = true;
+    }
+    void release() {
+        {
+            std::lock_guard<std::mutex> guard(gateMutex);
+            stalled = false;
+        }
+        gate.notify_all();
+    }
+    void passGate() {
+        std::unique_lock<std::mutex> lock(gateMutex);
+        if (stalled) {
+            ++waiting;
+            gate.wait(lock, [this] { return !stalled; });
+        }
+    }
 
     // This service; throws as an unreachable one would when down.
     FakeService& reached() {
@@ -73,6 +98,7 @@ public:
                 (time.length() > 0 ? time : BDateTime::Now().ToString()).c_str());
     }
     void getTimeStamp(const ACE_CString& host, const ACE_CString& n, BDateTime& ts) override {
+        m_s.passGate();
         std::lock_guard<std::mutex> guard(m_s.reached().mutex);
         ++m_s.timestamps;
         ts = BDateTime(m_s.find(host, n).time.c_str());

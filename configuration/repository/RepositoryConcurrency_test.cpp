@@ -1,7 +1,11 @@
-// Eight threads reading, storing and refreshing through one repository (run under
-// ThreadSanitizer in CI). Every read must give a whole document, never a torn one.
+// The repository under many threads (run under ThreadSanitizer in CI): whole documents for every
+// reader, cached reads that no hung service can stall, and one repository per process.
 #include <gtest/gtest.h>
 
+#include <chrono>
+#include <cstdlib>
+#include <future>
+#include <set>
 #include <thread>
 
 #include "Configuration/ConfigurationRepository.h"
@@ -23,50 +27,60 @@ std::string stored(const std::string& name) {
     return StoredForm::encode(*doc.writeVesk());
 }
 
-TEST(RepositoryConcurrency, ReadersWritersAndRefreshersShareOneRepository) {
+const char* const kNames[] = {"One", "Two", "Three"};
+
+class RepositoryConcurrency : public ::testing::Test {
+protected:
+    RepositoryConcurrency() {
+        machine.env["QUORVEX_EVENT_DIR"] = events.path();
+        local.name = "slave1";
+        master.name = "master";
+        connector->add("testhost", local);
+        connector->add("slave1", local);
+        connector->add("master", master);
+        for (const char* n : kNames) {
+            local.put("master", std::string("BrimmetServer\\") + n, stored(n),
+                      "2010-01-01T00:00:00.000");
+        }
+        repository = std::make_unique<ConfigurationRepository>(connector);
+        repository->SetMasterHostName("master");
+    }
+
     Quorvex::Testing::ScratchDir events;
     Quorvex::Testing::FakeMachine machine;
-    machine.env["QUORVEX_EVENT_DIR"] = events.path();
-    Quorvex::ScopedMachine scoped(machine);
+    Quorvex::ScopedMachine scoped{machine};
     Testing::FakeService local, master;
-    local.name = "slave1";
-    master.name = "master";
-    auto connector = std::make_shared<Testing::FakeConnector>("testhost");
-    connector->add("testhost", local);
-    connector->add("slave1", local);
-    connector->add("master", master);
-    const char* names[] = {"One", "Two", "Three"};
-    for (const char* n : names) {
-        local.put("master", std::string("BrimmetServer\\") + n, stored(n),
-                  "2010-01-01T00:00:00.000");
-    }
-    ConfigurationRepository repository(connector);
-    repository.SetMasterHostName("master");
+    std::shared_ptr<Testing::FakeConnector> connector =
+        std::make_shared<Testing::FakeConnector>("testhost");
+    std::unique_ptr<ConfigurationRepository> repository;
+};
 
+TEST_F(RepositoryConcurrency, ReadersWritersAndRefreshersShareOneRepository) {
+    const auto& names = kNames;
     std::atomic<int> failures{0};
     std::vector<std::thread> threads;
     for (int t = 0; t < 8; ++t) {
         threads.emplace_back([&, t] {
             for (int i = 0; i < 150; ++i) {
                 TestDocument doc(names[(t + i) % 3]);
-                if (repository.GetLatest(doc, i % 17 == 0) != 0 || doc.size != doc.name.length()) {
+                if (repository->GetLatest(doc, i % 17 == 0) != 0 || doc.size != doc.name.length()) {
                     ++failures;
                 }
                 if (t == 0 && i % 10 == 0) {
-                    repository.handle_signal(0);
+                    repository->handle_signal(0);
                 }
                 if (t == 1 && i % 25 == 0) {
                     TestDocument written("Written");
                     written.name = "abc";
                     written.size = 3;
-                    if (repository.Store(written) != 0) {
+                    if (repository->Store(written) != 0) {
                         ++failures;
                     }
                 }
                 if (t == 2) {
                     machine.advanceMilliseconds(7000);
                     ConfigCacheItemInfo info;
-                    repository.GetConfigCacheItemInfo("BrimmetServer\\One", info);
+                    repository->GetConfigCacheItemInfo("BrimmetServer\\One", info);
                 }
             }
         });
@@ -75,6 +89,58 @@ TEST(RepositoryConcurrency, ReadersWritersAndRefreshersShareOneRepository) {
         thread.join();
     }
     EXPECT_EQ(failures, 0);
+}
+
+// Guards against the cache lock being held across a request: one service that stops answering
+// stalled every thread's cached reads.
+TEST_F(RepositoryConcurrency, CachedReadsGoOnWhileAServiceHangs) {
+    TestDocument one("One");
+    TestDocument two("Two");
+    ASSERT_EQ(repository->GetLatest(one), 0);
+    ASSERT_EQ(repository->GetLatest(two), 0);
+    local.stall();
+    auto hung = std::async(std::launch::async, [&] {
+        TestDocument forced("One");
+        return repository->GetLatest(forced, true);
+    });
+    for (int i = 0; i < 500 && local.waiting == 0; ++i) {
+        std::this_thread::sleep_for(std::chrono::milliseconds(10));
+    }
+    ASSERT_EQ(local.waiting, 1);
+    auto cached = std::async(std::launch::async, [&] {
+        TestDocument again("Two");
+        return repository->GetLatest(again) == 0 && again.name == "Two";
+    });
+    const bool served = cached.wait_for(std::chrono::seconds(5)) == std::future_status::ready;
+    local.release();
+    EXPECT_TRUE(served);
+    EXPECT_TRUE(cached.get());
+    EXPECT_EQ(hung.get(), 0);
+}
+
+// Guards against instance() locking a fresh mutex on every call: threads racing on first use
+// each built a repository.
+TEST(RepositoryInstance, ThreadsRacingOnFirstUseShareOneRepository) {
+    Quorvex::Testing::ScratchDir store;
+    Quorvex::Testing::ScratchDir events;
+    setenv("QUORVEX_CONFIGURATION_STORE", store.path().c_str(), 1);
+    setenv("QUORVEX_EVENT_DIR", events.path().c_str(), 1);
+    std::promise<void> start;
+    std::shared_future<void> go = start.get_future().share();
+    std::vector<std::future<ConfigurationRepository*>> callers;
+    for (int i = 0; i < 16; ++i) {
+        callers.push_back(std::async(std::launch::async, [go] {
+            go.wait();
+            return ConfigurationRepository::instance();
+        }));
+    }
+    start.set_value();
+    std::set<ConfigurationRepository*> seen;
+    for (auto& caller : callers) {
+        seen.insert(caller.get());
+    }
+    EXPECT_EQ(seen.size(), 1u);
+    EXPECT_NE(*seen.begin(), nullptr);
 }
 
 }  // namespace

@@ -12,8 +12,12 @@
 //     OrvelSystemConfiguration system;
 //     if (ConfigurationRepository::instance()->GetLatest(system) == 0) { ... }
 //     ConfigurationRepository::instance()->Store(system);
-// The repository owns its cached copies; the caller's documents stay the caller's. Every public
-// call is thread-safe. Remote failures never throw: they give -1 and a log line.
+// The repository owns its cached copies; the caller's documents stay the caller's. A document is
+// cached as its element tree beside a typed copy per class, so classes that name the same
+// document are all served from the cache. Every public call is thread-safe; the cache lock is
+// never held across a request to a service, so a slow service delays only the calls that need
+// it. Remote failures never throw: they give -1 and a log line, and the caller's document keeps
+// what it had.
 #pragma once
 
 #include <ace/Event_Handler.h>
@@ -38,6 +42,7 @@ class NamedEvent;
 
 namespace Configuration {
 
+class CachedDocument;
 class ServiceConnection;
 class ServiceConnector;
 
@@ -114,15 +119,21 @@ public:
     int handle_input(ACE_HANDLE handle) override;
 
 private:
-    ConfigDoc& GetLatest_i(ConfigDoc& document, bool force);
-    int ReadItem(const ACE_CString& name, ConfigDoc& document);
+    void GetLatest_i(ConfigDoc& document, bool force);
+    std::shared_ptr<const CachedDocument> fetch(
+        const ACE_CString& host, const ConfigDoc& document,
+        const std::shared_ptr<const CachedDocument>& cached);
+    void keep(const ACE_CString& path, const std::shared_ptr<const CachedDocument>& expected,
+              const std::shared_ptr<const CachedDocument>& entry);
+    int ReadItem(const ACE_CString& name, ConfigDoc& document, Vesk::Element& tree);
     Quorvex::auto_ptr<Vesk::Element> WriteItem(const ACE_CString& name, ConfigDoc& document);
     int cacheItemInfo(const ACE_CString& path, ConfigCacheItemInfo& info) const;
     ACE_CString hostFor(const ConfigDoc& document) const;
     void openChangeEvent();
     void signalLocal(void (*call)(ServiceConnection&), const char* failure);
 
-    std::map<ACE_CString, std::unique_ptr<ConfigDoc>> m_cache;
+    // Path to its cached entry; entries are shared and never changed, only replaced.
+    std::map<ACE_CString, std::shared_ptr<const CachedDocument>> m_cache;
     mutable ACE_Thread_Mutex m_cacheLock;
     ACE_CString m_virtualHostName;
     ACE_CString m_masterHostName;
