@@ -1,6 +1,5 @@
 // Testing::Convention: a test class with one field of every form the convention offers, for the
-// convention's tests and its fuzz target. It defines its members here: include it in one
-// translation unit of a program only.
+// convention's tests and its fuzz target.
 #pragma once
 
 #include <map>
@@ -122,7 +121,7 @@ void Convention::fields(Self& self, Io& io) {
     io("ParamCount", Fields::derived(self.paramCount));
 }
 
-CONFIGURATION_DEFINE(Convention, "Convention", Fields::FailureForm::PartialDefaults)
+CONFIGURATION_DEFINE_INLINE(Convention, "Convention", Fields::FailureForm::PartialDefaults)
 
 // Derived data follows the fields; the hook's false makes the read incomplete.
 inline bool Convention::afterRead() {

@@ -139,23 +139,19 @@ TEST_F(RepositoryTest, UnreadableDocumentGivesMinusOneAndKeepsDefaults) {
 
 // A second class of the stored document "TestDoc" that reads only its name.
 class NameOnly : public TypedConfigDoc<NameOnly> {
+    CONFIGURATION_CLASS(NameOnly);
+
 public:
     NameOnly() : TypedConfigDoc(ConfigDoc::getConfigurationRegistryPath() + "TestDoc", false) {}
-    bool readVesk(const Vesk::Element& e) override {
-        return Fields::read(*this, e, "NameOnly", Fields::FailureForm::Failed);
-    }
-    Quorvex::auto_ptr<Vesk::Element> writeVesk() const override {
-        return Fields::write(*this, "TestDoc");
-    }
     ACE_CString name;
-
-private:
-    friend struct Fields::Access;
-    template <class Self, class Io>
-    static void fields(Self& s, Io& io) {
-        io("Name", s.name);
-    }
 };
+
+template <class Self, class Io>
+void NameOnly::fields(Self& self, Io& io) {
+    io("Name", self.name);
+}
+
+CONFIGURATION_DEFINE(NameOnly, "TestDoc", Fields::FailureForm::Failed)
 
 // Guards against the cache keeping only the first class's copy: a second class of the same
 // document got std::bad_cast and -1.
