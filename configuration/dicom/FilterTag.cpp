@@ -2,6 +2,7 @@
 #include "Configuration/FilterTag.h"
 
 #include "Configuration/FilterTagList.h"
+#include "ListReserve.h"
 #include "model/ClassDefinition.h"
 
 namespace Configuration {
@@ -24,7 +25,7 @@ void FilterTagList::fields(Self& self, Io& io) {
     io(FilterTag::WELL_KNOWN_NAME, Fields::items(self.m_tags, Fields::Append));
 }
 
-CONFIGURATION_DEFINE_READ(FilterTagList, Fields::FailureForm::Failed)
+DICOM_LIST_DEFINE_READ(FilterTagList, m_tags, FilterTag::WELL_KNOWN_NAME)
 CONFIGURATION_DEFINE_NO_WRITE(FilterTagList, "FilterTagList::writeVesk - Not supported.")
 CONFIGURATION_DEFINE_EQUAL(FilterTagList)
 

@@ -3,6 +3,7 @@
 #include "Configuration/SOPService.h"
 
 #include "Configuration/SOPServiceList.h"
+#include "ListReserve.h"
 #include "model/ClassDefinition.h"
 
 namespace Configuration {
@@ -49,20 +50,7 @@ SOPObjectType SOPService::Str2SOPObjectType(ACE_CString text) {
 }
 
 ACE_CString SOPService::SOPObjectType2Str(SOPObjectType type) {
-    switch (type) {
-        case SOPObjectTypeGSPS:
-            return SOPObjectTypeText::kGSPS;
-        case SOPObjectTypeSR:
-            return SOPObjectTypeText::kSR;
-        case SOPObjectTypeKO:
-            return SOPObjectTypeText::kKO;
-        case SOPObjectTypePrivate:
-            return SOPObjectTypeText::kPrivate;
-        case SOPObjectTypeCSPS:
-            return SOPObjectTypeText::kCSPS;
-        default:
-            return SOPObjectTypeText::kImage;
-    }
+    return sopObjectTypeText(type);
 }
 
 template <class Self, class Io>
@@ -70,7 +58,7 @@ void SOPServiceList::fields(Self& self, Io& io) {
     io(SOPService::WELL_KNOWN_NAME, Fields::items(self.m_services, Fields::Append));
 }
 
-CONFIGURATION_DEFINE_READ(SOPServiceList, Fields::FailureForm::Failed)
+DICOM_LIST_DEFINE_READ(SOPServiceList, m_services, SOPService::WELL_KNOWN_NAME)
 CONFIGURATION_DEFINE_NO_WRITE(SOPServiceList, "SOPServiceList::writeVesk - Not supported.")
 CONFIGURATION_DEFINE_EQUAL(SOPServiceList)
 

@@ -18,6 +18,30 @@ bool readIfPresent(const Vesk::MultiElementValue& children, const char* key,
     return child == nullptr || object.readVesk(*child);
 }
 
+// Holds a look-up index of the master table in slot while it lives, unless slot holds one already
+// (so that the passes of one read share one index, and a pass on its own builds its own).
+class IndexScope {
+public:
+    IndexScope(std::shared_ptr<SOPServiceIndex>& slot,
+               const std::vector<SupportedTransferSyntax>& rows)
+        : m_slot(slot), m_owner(!slot) {
+        if (m_owner) {
+            m_slot = std::make_shared<SOPServiceIndex>(rows);
+        }
+    }
+    ~IndexScope() {
+        if (m_owner) {
+            m_slot.reset();
+        }
+    }
+    IndexScope(const IndexScope&) = delete;
+    IndexScope& operator=(const IndexScope&) = delete;
+
+private:
+    std::shared_ptr<SOPServiceIndex>& m_slot;
+    bool m_owner;
+};
+
 }  // namespace
 
 // Compared in this order; readVesk below reads the same keys.
@@ -57,6 +81,7 @@ bool SOPServiceConfiguration::readVesk(const Vesk::Element& element) {
         complete =
             readIfPresent(children, TemplateTransferSyntaxLists::WELL_KNOWN_NAME, m_templates) &&
             complete;
+        const IndexScope index(m_index, m_supported.getSupportedTransferSyntaxes());
         ProcessTemplateTransferSyntaxLists();
         complete = readIfPresent(children, SOPServiceList::WELL_KNOWN_NAME, m_services) && complete;
         ProcessSOPServiceList();
@@ -64,30 +89,29 @@ bool SOPServiceConfiguration::readVesk(const Vesk::Element& element) {
             readIfPresent(children, FilterTagList::WELL_KNOWN_NAME, m_filterTags) && complete;
         return complete;
     } catch (const std::exception& e) {
-        m_index.reset();
         Fields::logReadFailure("SOPServiceConfiguration", Fields::FailureForm::Failed, e.what());
         return false;
     }
 }
 
 void SOPServiceConfiguration::ProcessTemplateTransferSyntaxLists() {
-    m_index = std::make_shared<SOPServiceIndex>(m_supported.getSupportedTransferSyntaxes());
+    const IndexScope index(m_index, m_supported.getSupportedTransferSyntaxes());
     for (TemplateTransferSyntaxList& entry : m_templates.m_templates) {
         Str2TransferSyntaxList(entry.m_listText, entry.m_transferSyntaxList);
     }
-    m_index.reset();
 }
 
 void SOPServiceConfiguration::ProcessSOPServiceList() {
-    m_index = std::make_shared<SOPServiceIndex>(m_supported.getSupportedTransferSyntaxes());
+    const IndexScope index(m_index, m_supported.getSupportedTransferSyntaxes());
     m_index->indexTemplates(m_templates.m_templates);
     for (SOPService& service : m_services.m_services) {
         std::vector<TransferSyntax>& entries = service.m_transferSyntaxList.getTransferSyntaxes();
         const TemplateTransferSyntaxList* found =
             GetTemplateTxList(service.m_defaultListText, service.m_additional);
         if (found != nullptr) {
-            for (const TransferSyntax& entry :
-                 found->getTransferSyntaxList().getTransferSyntaxes()) {
+            const auto& offered = found->getTransferSyntaxList().getTransferSyntaxes();
+            entries.reserve(entries.size() + offered.size());
+            for (const TransferSyntax& entry : offered) {
                 entries.emplace_back(entry.sharedRow());  // enabled, whatever the template says
             }
             service.m_templateName = service.m_defaultListText;
@@ -98,7 +122,6 @@ void SOPServiceConfiguration::ProcessSOPServiceList() {
             UpdateTransferSyntaxList(service.m_transferSyntaxList, service.m_modificationListText);
         }
     }
-    m_index.reset();
 }
 
 TemplateTransferSyntaxList* SOPServiceConfiguration::GetTemplateTxList(const ACE_CString& name,

@@ -2,6 +2,7 @@
 #include "Configuration/SupportedTransferSyntax.h"
 
 #include "Configuration/SupportedTransferSyntaxList.h"
+#include "ListReserve.h"
 #include "model/ClassDefinition.h"
 
 namespace Configuration {
@@ -24,7 +25,8 @@ void SupportedTransferSyntaxList::fields(Self& self, Io& io) {
     io(SupportedTransferSyntax::WELL_KNOWN_NAME, Fields::items(self.m_rows, Fields::Append));
 }
 
-CONFIGURATION_DEFINE_READ(SupportedTransferSyntaxList, Fields::FailureForm::Failed)
+DICOM_LIST_DEFINE_READ(SupportedTransferSyntaxList, m_rows,
+                       SupportedTransferSyntax::WELL_KNOWN_NAME)
 CONFIGURATION_DEFINE_NO_WRITE(SupportedTransferSyntaxList,
                               "SupportedTransferSyntaxList::writeVesk - Not supported.")
 CONFIGURATION_DEFINE_EQUAL(SupportedTransferSyntaxList)

@@ -3,6 +3,7 @@
 #include "Configuration/TemplateTransferSyntaxList.h"
 
 #include "Configuration/TemplateTransferSyntaxLists.h"
+#include "ListReserve.h"
 #include "model/ClassDefinition.h"
 
 namespace Configuration {
@@ -27,7 +28,8 @@ void TemplateTransferSyntaxLists::fields(Self& self, Io& io) {
        Fields::items(self.m_templates, Fields::Append));
 }
 
-CONFIGURATION_DEFINE_READ(TemplateTransferSyntaxLists, Fields::FailureForm::Failed)
+DICOM_LIST_DEFINE_READ(TemplateTransferSyntaxLists, m_templates,
+                       TemplateTransferSyntaxList::WELL_KNOWN_NAME)
 CONFIGURATION_DEFINE_NO_WRITE(TemplateTransferSyntaxLists,
                               "TemplateTransferSyntaxLists::writeVesk - Not supported.")
 CONFIGURATION_DEFINE_EQUAL(TemplateTransferSyntaxLists)

@@ -1,6 +1,7 @@
 // Configuration::SOPObjectType: the kind of object a SOP service stores, and the fixed text of
 // each kind as the SOP service document spells it. "SPECIAL" belongs to the same family of texts
-// but names no kind: a service that says "SPECIAL" stores "IMAGE" objects. Constants; thread-safe.
+// but names no kind: a service that says "SPECIAL" stores "IMAGE" objects. Constants and a pure
+// function; thread-safe.
 #pragma once
 
 namespace Configuration {
@@ -26,4 +27,23 @@ constexpr const char kCSPS[] = "CSPS";
 constexpr const char kSpecial[] = "SPECIAL";
 
 }  // namespace SOPObjectTypeText
+
+// The text of a kind; a value outside the enumeration is "IMAGE".
+inline const char* sopObjectTypeText(SOPObjectType type) {
+    switch (type) {
+        case SOPObjectTypeGSPS:
+            return SOPObjectTypeText::kGSPS;
+        case SOPObjectTypeSR:
+            return SOPObjectTypeText::kSR;
+        case SOPObjectTypeKO:
+            return SOPObjectTypeText::kKO;
+        case SOPObjectTypePrivate:
+            return SOPObjectTypeText::kPrivate;
+        case SOPObjectTypeCSPS:
+            return SOPObjectTypeText::kCSPS;
+        default:
+            return SOPObjectTypeText::kImage;
+    }
+}
+
 }  // namespace Configuration
