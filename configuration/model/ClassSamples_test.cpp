@@ -3,7 +3,8 @@
 // object writes. A new class adds its two samples and one row to kClasses. A read-only class
 // (readOnlyRow: its writeVesk refuses with "NAME::writeVesk - Not supported.") has a defaults
 // sample that reads complete into a default object; its keys without a fixed default (one that
-// another key gives, or whose presence matters) are left out of it.
+// another key gives, or whose presence matters) are left out of it. A row's fatal keys are those
+// whose absence is a logged failure that ends the read (withFatalKeys).
 #include <gtest/gtest.h>
 
 #include <functional>
@@ -14,8 +15,10 @@
 #include "Configuration/AnonParam.h"
 #include "Configuration/DMWLTarget.h"
 #include "Configuration/DicomClientConfiguration.h"
+#include "Configuration/KelExportRemoteScp.h"
 #include "Configuration/OrvelSystemConfiguration.h"
 #include "Configuration/SOPServiceConfiguration.h"
+#include "Configuration/StorageCommitConfiguration.h"
 #include "ElementTestSupport.h"
 #include "Vesk/XmlUtils.h"
 #include "testing/FakeMachine.h"
@@ -33,22 +36,36 @@ struct ClassRow {
     std::set<std::string> optionalKeys;  // keys whose absence does not make the read incomplete
     std::function<std::unique_ptr<Vesk::Serializable>()> make;
     std::function<bool(const Vesk::Serializable&, const Vesk::Serializable&)> equal;
-    bool writes = true;  // false: writeVesk refuses
+    bool writes = true;               // false: writeVesk refuses
+    std::string refusal;              // what writeVesk refuses with, when it does
+    std::set<std::string> fatalKeys;  // absent: a logged failure that ends the read
 };
 
 template <class T>
 ClassRow row(const char* name, const char* failureForm, std::set<std::string> optionalKeys = {}) {
-    return ClassRow{name, failureForm, std::move(optionalKeys),
+    return ClassRow{name,
+                    failureForm,
+                    std::move(optionalKeys),
                     [] { return std::make_unique<T>(); },
                     [](const Vesk::Serializable& a, const Vesk::Serializable& b) {
                         return dynamic_cast<const T&>(a) == dynamic_cast<const T&>(b);
-                    }};
+                    },
+                    true,
+                    "",
+                    {}};
 }
 
 template <class T>
-ClassRow readOnlyRow(const char* name, std::set<std::string> optionalKeys = {}) {
+ClassRow readOnlyRow(const char* name, std::set<std::string> optionalKeys = {},
+                     const char* refusal = "::writeVesk - Not supported.") {
     ClassRow r = row<T>(name, kFailed, std::move(optionalKeys));
     r.writes = false;
+    r.refusal = name + std::string(refusal);
+    return r;
+}
+
+ClassRow withFatalKeys(ClassRow r, std::set<std::string> fatalKeys) {
+    r.fatalKeys = std::move(fatalKeys);
     return r;
 }
 
@@ -74,6 +91,18 @@ const ClassRow kClasses[] = {
     row<SOPClass>("SOPClass", kFailed),
     row<DMWLTarget>("DMWLTarget", kFailed),
     row<DicomClientConfiguration>("DicomClientConfiguration", kFailed),
+    row<RemoteSCPConfiguration>("RemoteSCPConfiguration", kFailed),
+    withFatalKeys(row<StorageCommitScpConfiguration>("StorageCommitScpConfiguration", kFailed),
+                  {"RemoteScp"}),
+    withFatalKeys(
+        row<StorageCommitRemoteSCPConfiguration>("StorageCommitRemoteSCPConfiguration", kFailed),
+        {"RemoteScp"}),
+    withFatalKeys(row<StorageCommitConfiguration>("StorageCommitConfiguration", kFailed),
+                  {"StorageCommitRemoteConfigurations"}),
+    withFatalKeys(
+        row<KelExportRemoteScp>("KelExportRemoteScp", kFailed,
+                                {"ForwardImages", "ForwardMPPS", "StorageCommitScpConfiguration"}),
+        {"RemoteScp"}),
 };
 
 // The children of element with that key, in order.
@@ -104,7 +133,7 @@ void expectWriteRefused(const ClassRow& c, const Vesk::Serializable& object) {
         object.writeVesk();
         ADD_FAILURE() << c.name << " wrote itself";
     } catch (const std::exception& e) {
-        EXPECT_EQ(c.name + "::writeVesk - Not supported.", e.what());
+        EXPECT_EQ(c.refusal, e.what());
     }
 }
 
@@ -149,6 +178,14 @@ void expectReadOnlyKeepsDefault(const ClassRow& c, const Vesk::Element& sample,
     EXPECT_TRUE(c.equal(object, *reference)) << "without " << left.c_str();
 }
 
+// Without a fatal key the read fails with the class's logged failure.
+void expectFatal(const ClassRow& c, const Vesk::Element& partial, const ACE_CString& left) {
+    Quorvex::Testing::LogCapture log;
+    EXPECT_FALSE(c.make()->readVesk(partial)) << left.c_str();
+    ASSERT_EQ(1u, log.records().size()) << left.c_str();
+    EXPECT_EQ(0u, log.records()[0].text.rfind(c.name + c.failureForm, 0)) << left.c_str();
+}
+
 // Each key left out in turn: it keeps its default, every other key is still read, and the read
 // reports the document incomplete unless the key is optional.
 TEST_P(ClassSamples, EachMissingKeyKeepsItsDefaultAndTheRestIsRead) {
@@ -169,6 +206,10 @@ TEST_P(ClassSamples, EachMissingKeyKeepsItsDefaultAndTheRestIsRead) {
             }
         }
         auto object = c().make();
+        if (c().fatalKeys.count(left.c_str()) == 1) {
+            expectFatal(c(), partial, left);
+            continue;
+        }
         EXPECT_EQ(c().optionalKeys.count(left.c_str()) == 1, object->readVesk(partial))
             << left.c_str();
         if (!c().writes) {

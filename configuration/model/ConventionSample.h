@@ -77,8 +77,9 @@ public:
     std::vector<ACE_CString> listed;
     std::vector<std::pair<ACE_CString, ACE_CString>> targets;
     std::vector<Hop> hops;
-    ACE_CString note;            // read and written, not compared
-    std::size_t paramCount = 0;  // derived after reading
+    ACE_CString note;             // read and written, not compared
+    std::size_t paramCount = 0;   // derived after reading
+    ACE_CString mandatory = "m";  // absent: a logged failure
     bool hookResult = true;
 
 private:
@@ -119,6 +120,7 @@ void Convention::fields(Self& self, Io& io) {
     io("Hops", Fields::listValue(self.hops));
     io("Note", Fields::uncompared(self.note));
     io("ParamCount", Fields::derived(self.paramCount));
+    io("Mandatory", Fields::required(self.mandatory));
 }
 
 CONFIGURATION_DEFINE_INLINE(Convention, "Convention", Fields::FailureForm::PartialDefaults)

@@ -383,6 +383,54 @@ Converted<T, Parse, Print> text(T& field, Parse parse, Print print) {
 }
 
 template <class F>
+struct Required : Form {
+    F inner;
+    bool read(const In& in, const char* key) const {
+        in.children.getElement(keyOf(key));  // absent: the element library's TrelException
+        return inner.read(in, key);
+    }
+    void write(Out& out, const char* key) const { inner.write(out, key); }
+    template <class C>
+    void compare(C& c) const {
+        inner.compare(c);
+    }
+};
+
+// Read like x, but an absent key is thrown, not counted: the class logs its read failure and the
+// fields after it keep what they had (a child the class cannot do without).
+template <class X>
+auto required(X&& x) {
+    return Required<decltype(formOf(x))>{{}, formOf(x)};
+}
+
+template <class B>
+struct BasePart : Form {
+    using Base = std::remove_const_t<B>;
+    B& part;
+    bool read(const In& in, const char* key) const {
+        const Vesk::Element* child = in.children.find(keyOf(key));
+        return child != nullptr && part.Base::readVesk(*child);
+    }
+    void write(Out& out, const char* key) const {
+        Quorvex::auto_ptr<Vesk::Element> tree = part.Base::writeVesk();
+        tree->setKey(ACE_CString(key));
+        out.children.addElement(tree.release());
+    }
+    template <class C>
+    void compare(C& c) const {
+        c.add(part);
+    }
+};
+
+// The part of self that its base class Base holds, read and written by Base's own readVesk and
+// writeVesk (not the derived class's overrides) in a nested child.
+template <class Base, class Self>
+auto basePart(Self& self) {
+    using B = std::conditional_t<std::is_const<Self>::value, const Base, Base>;
+    return BasePart<B>{{}, static_cast<B&>(self)};
+}
+
+template <class F>
 struct Uncompared : Form {
     F inner;
     bool read(const In& in, const char* key) const { return inner.read(in, key); }

@@ -65,6 +65,7 @@ Convention filled() {
     c.targets = {{"DIRECT=OS:p1\\private$\\quorvexin", "DIRECT=OS:m1\\private$\\quorvexin"}};
     c.hops = {Hop{"DIRECT=OS:h\\private$\\q", 1, false}};
     c.note = "free text";
+    c.mandatory = "given";
     return c;
 }
 
@@ -148,7 +149,7 @@ TEST(ConventionForms, WhichAbsentKeysMakeTheReadIncomplete) {
         {"Param", true},         {"OptionalText", true}, {"Forward", true},  {"Enabled", true},
         {"TxList", true},        {"Kept", false},        {"Dropped", false}, {"ByTag", false},
         {"Titles", false},       {"Targets", false},     {"Hops", false},    {"Note", false},
-        {"ParamCount", true}};
+        {"ParamCount", true},    {"Mandatory", false}};
     for (const AbsentCase& c : cases) {
         Convention read;
         EXPECT_EQ(c.complete, read.readVesk(edited(c.key))) << c.key;
@@ -156,6 +157,17 @@ TEST(ConventionForms, WhichAbsentKeysMakeTheReadIncomplete) {
     Vesk::Element bare(sample().key(), -1);
     bare.setValue(sample().getMultiElement().clone());
     EXPECT_FALSE(Convention().readVesk(bare));  // the "Id" attribute counts as a key
+}
+
+// A required key's absence is thrown: the read logs the class's failure, what came before stays.
+TEST(ConventionForms, AbsentRequiredKeyIsALoggedFailure) {
+    Quorvex::Testing::LogCapture log;
+    Convention read;
+    EXPECT_FALSE(read.readVesk(edited("Mandatory")));
+    EXPECT_EQ("m", read.mandatory);
+    EXPECT_EQ("given", read.optionalText);
+    ASSERT_EQ(1u, log.records().size());
+    EXPECT_NE(std::string::npos, log.records()[0].text.find("Mandatory")) << log.records()[0].text;
 }
 
 TEST(ConventionForms, AbsentOptionalKeysKeepTakeOrCopyTheirValues) {
