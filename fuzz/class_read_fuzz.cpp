@@ -9,10 +9,19 @@
 #include <exception>
 
 #include "Configuration/AnonParam.h"
+#include "Configuration/AutoExportConfiguration.h"
 #include "Configuration/DMWLTarget.h"
 #include "Configuration/DicomClientConfiguration.h"
+#include "Configuration/KelExportConfigurationAdapter.h"
+#include "Configuration/KelExportLocalConfiguration.h"
+#include "Configuration/KelExportRemoteConfigurations.h"
+#include "Configuration/KelExportWebService.h"
+#include "Configuration/KelQueryConfiguration.h"
 #include "Configuration/OrvelSystemConfiguration.h"
+#include "Configuration/QrscpConfiguration.h"
 #include "Configuration/SOPServiceConfiguration.h"
+#include "Configuration/SSCPConfiguration.h"
+#include "Configuration/StorageCommitConfiguration.h"
 #include "ConventionSample.h"
 #include "Vesk/XmlUtils.h"
 
@@ -71,6 +80,27 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     readTwiceRefuseWrite<Configuration::FilterTag>(tree);
     readTwiceRefuseWrite<Configuration::FilterTagList>(tree);
     readTwiceRefuseWrite<Configuration::SOPServiceConfiguration>(tree);
+    readWriteRead<Configuration::RemoteSCPConfiguration>(tree);
+    readWriteRead<Configuration::StorageCommitScpConfiguration>(tree);
+    readWriteRead<Configuration::StorageCommitRemoteSCPConfiguration>(tree);
+    readWriteRead<Configuration::StorageCommitConfiguration>(tree);
+    readWriteRead<Configuration::ServerDicomSource>(tree);
+    readWriteRead<Configuration::SSCPConfiguration>(tree);
+    readWriteRead<Configuration::QrscpConfiguration>(tree);
+    readWriteRead<Configuration::KelExportRemoteScp>(tree);
+    readWriteRead<Configuration::KelExportRemoteConfigurations>(tree);
+    readWriteRead<Configuration::KelExportDatabaseConfiguration>(tree);
+    readWriteRead<Configuration::KelExportGlobalConfiguration>(tree);
+    readWriteRead<Configuration::KelExportConfigurationAdapter>(tree);
+    readWriteRead<Configuration::KelExportLocalConfiguration>(tree);
+    readWriteRead<Configuration::KelExportWebService>(tree);
+    readTwiceRefuseWrite<Configuration::Criterion>(tree);
+    readTwiceRefuseWrite<Configuration::Destination>(tree);
+    readTwiceRefuseWrite<Configuration::AutoExportRule>(tree);
+    readTwiceRefuseWrite<Configuration::AutoExportConfiguration>(tree);
+    readWriteRead<Configuration::KelQueryRemoteSCPConfiguration>(tree);
+    readWriteRead<Configuration::PrefetchConfiguration__>(tree);
+    readWriteRead<Configuration::KelQueryConfiguration>(tree);
     readWriteRead<Configuration::Testing::Convention>(tree);
     return 0;
 }

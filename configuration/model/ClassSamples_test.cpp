@@ -13,11 +13,19 @@
 #include <string>
 
 #include "Configuration/AnonParam.h"
+#include "Configuration/AutoExportConfiguration.h"
 #include "Configuration/DMWLTarget.h"
 #include "Configuration/DicomClientConfiguration.h"
+#include "Configuration/KelExportGlobalConfiguration.h"
+#include "Configuration/KelExportLocalConfiguration.h"
+#include "Configuration/KelExportRemoteConfigurations.h"
 #include "Configuration/KelExportRemoteScp.h"
+#include "Configuration/KelExportWebService.h"
+#include "Configuration/KelQueryConfiguration.h"
 #include "Configuration/OrvelSystemConfiguration.h"
+#include "Configuration/QrscpConfiguration.h"
 #include "Configuration/SOPServiceConfiguration.h"
+#include "Configuration/SSCPConfiguration.h"
 #include "Configuration/StorageCommitConfiguration.h"
 #include "ElementTestSupport.h"
 #include "Vesk/XmlUtils.h"
@@ -57,10 +65,10 @@ ClassRow row(const char* name, const char* failureForm, std::set<std::string> op
 
 template <class T>
 ClassRow readOnlyRow(const char* name, std::set<std::string> optionalKeys = {},
-                     const char* refusal = "::writeVesk - Not supported.") {
+                     const char* refusal = nullptr) {
     ClassRow r = row<T>(name, kFailed, std::move(optionalKeys));
     r.writes = false;
-    r.refusal = name + std::string(refusal);
+    r.refusal = refusal != nullptr ? refusal : name + std::string("::writeVesk - Not supported.");
     return r;
 }
 
@@ -103,6 +111,30 @@ const ClassRow kClasses[] = {
         row<KelExportRemoteScp>("KelExportRemoteScp", kFailed,
                                 {"ForwardImages", "ForwardMPPS", "StorageCommitScpConfiguration"}),
         {"RemoteScp"}),
+    row<ServerDicomSource>("ServerDicomSource", kFailed),
+    row<SSCPConfiguration>("SSCPConfiguration",
+                           "::readVesk: Failed - using partial defaults. Standard Exception: "),
+    row<QrscpConfiguration>("QrscpConfiguration", kFailed),
+    row<KelExportDatabaseConfiguration>("KelExportDatabaseConfiguration", kFailed),
+    withFatalKeys(row<KelExportGlobalConfiguration>("KelExportGlobalConfiguration", kFailed),
+                  {"AnonymizationParams"}),
+    row<KelExportLocalConfiguration>("KelExportLocalConfiguration", kFailed),
+    withFatalKeys(row<KelExportRemoteConfigurations>("KelExportRemoteConfigurations", kFailed),
+                  {"KelExportRemoteSCPs"}),
+    row<KelExportWebService>("KelExportWebService", kFailed),
+    readOnlyRow<Destination>("Destination", {},
+                             "Criterion::writeVesk - Class cannot be serialized."),
+    readOnlyRow<AutoExportRule>("AutoExportRule", {},
+                                "AutoExportRule::writeVesk - Class cannot be serialized."),
+    withFatalKeys(readOnlyRow<AutoExportConfiguration>(
+                      "AutoExportConfiguration", {},
+                      "AutoExportConfiguration::writeVesk - Class cannot be serialized."),
+                  {"AutoExportRules"}),
+    withFatalKeys(row<KelQueryRemoteSCPConfiguration>("KelQueryRemoteSCPConfiguration", kFailed),
+                  {"RemoteScp", "QueryModel"}),
+    row<PrefetchConfiguration__>("PrefetchConfiguration__", kFailed),
+    withFatalKeys(row<KelQueryConfiguration>("KelQueryConfiguration", kFailed, {"Prefetch"}),
+                  {"Archives"}),
 };
 
 // The children of element with that key, in order.
@@ -231,6 +263,7 @@ TEST_P(ClassSamples, EachMissingKeyKeepsItsDefaultAndTheRestIsRead) {
 TEST_P(ClassSamples, ElementOfAnotherKindLogsTheClassFailureAndKeepsDefaults) {
     Quorvex::Testing::LogCapture log;
     Vesk::Element notAList(m_sample.key(), -1);
+    notAList.insertAttributes(m_sample.attributes());  // a rule's name, say, is still there
     notAList.addSingle().assign("text");
     auto object = c().make();
     EXPECT_FALSE(object->readVesk(notAList));
