@@ -16,17 +16,23 @@
 #include "Configuration/AutoExportConfiguration.h"
 #include "Configuration/DMWLTarget.h"
 #include "Configuration/DicomClientConfiguration.h"
+#include "Configuration/KelArchiveConfiguration.h"
 #include "Configuration/KelExportGlobalConfiguration.h"
 #include "Configuration/KelExportLocalConfiguration.h"
 #include "Configuration/KelExportRemoteConfigurations.h"
 #include "Configuration/KelExportRemoteScp.h"
 #include "Configuration/KelExportWebService.h"
 #include "Configuration/KelQueryConfiguration.h"
+#include "Configuration/LegacyMirrorStackMapping.h"
+#include "Configuration/LocationConfiguration.h"
+#include "Configuration/LocationMigrationChain.h"
 #include "Configuration/OrvelSystemConfiguration.h"
 #include "Configuration/QrscpConfiguration.h"
+#include "Configuration/RulesConfiguration.h"
 #include "Configuration/SOPServiceConfiguration.h"
 #include "Configuration/SSCPConfiguration.h"
 #include "Configuration/StorageCommitConfiguration.h"
+#include "Configuration/StrategyConfiguration.h"
 #include "ElementTestSupport.h"
 #include "Vesk/XmlUtils.h"
 #include "testing/FakeMachine.h"
@@ -135,6 +141,24 @@ const ClassRow kClasses[] = {
     row<PrefetchConfiguration__>("PrefetchConfiguration__", kFailed),
     withFatalKeys(row<KelQueryConfiguration>("KelQueryConfiguration", kFailed, {"Prefetch"}),
                   {"Archives"}),
+    row<LegacyMirrorStackMapping>("LegacyMirrorStackMapping", kFailed),
+    row<Strategy>("Strategy", kFailed),
+    row<StrategyStack>("StrategyStack", kFailed),
+    row<StrategyConfiguration>("StrategyConfiguration", kFailed),
+    row<MigrationRule>("MigrationRule", kPartialDefaults, {"Filter"}),
+    row<RegistrationRule>("RegistrationRule", kPartialDefaults),
+    row<LocationMigrationFilter>("LocationMigrationFilter", kFailed, {"MigrationRule"}),
+    row<LocationMigrationChain>("LocationMigrationChain", kFailed, {"MigrationChain"}),
+    row<RulesConfiguration>("RulesConfiguration", kFailed),
+    row<TivoliServerInfo>("TivoliServerInfo", kFailed),
+    row<TivoliNodeInfo>("TivoliNodeInfo", kFailed),
+    row<ArchiveLocalNodeInfo>("ArchiveLocalNodeInfo", kFailed),
+    row<ArchiveNodeStackInfo>("ArchiveNodeStackInfo", kFailed),
+    withFatalKeys(row<KelArchiveConfiguration>("KelArchiveConfiguration", kFailed),
+                  {"TivoliServers"}),
+    row<LocationProfile>("LocationProfile", kFailed,
+                         {"LocalServers", "CollectIpFilters", "MergeTraceLevels"}),
+    row<LocationConfiguration>("LocationConfiguration", kFailed),
 };
 
 // The children of element with that key, in order.
