@@ -56,6 +56,43 @@ TEST(Configctl, FailuresExitNonZeroWithOneLine) {
     EXPECT_EQ(configctl("--server 127.0.0.1:1 hosts").status, 1);
 }
 
+// The SOP service sample, stored as is: each service with the syntaxes it accepts, by UID and name.
+TEST(Configctl, SopPrintsEachServiceWithTheSyntaxesItAccepts) {
+    ServiceTesting::InProcessService service;
+    const std::string server = "--server " + service.address();
+    const std::string sample = std::string(QUORVEX_EXAMPLES) + "/dicom/SOPServiceConfiguration.xml";
+    ASSERT_EQ(configctl(server + " put 'BrimmetServer\\SOPServiceConfiguration' " + sample).status,
+              0);
+    const ToolRun sop = configctl(server + " sop");
+    ASSERT_EQ(sop.status, 0) << sop.out;
+    const char* const kExpected[] = {
+        "69 services (66 offered), 28 transfer syntaxes, 8 templates\n",
+        "\nVideo Photographic Image Storage\n"
+        "  UID          1.2.840.10008.5.1.4.1.1.77.1.4.1\n"
+        "  Object type  IMAGE\n"
+        "  Template     Video\n"
+        "  Offered      yes\n"
+        "  Transfer syntaxes: 3 of 11 enabled\n"
+        "    1.2.840.10008.1.2.1      Explicit VR Little Endian\n"
+        "    1.2.840.10008.1.2.4.100  MPEG2 Main Profile @ Main Level\n"
+        "    1.2.840.10008.1.2.4.102  MPEG-4 AVC/H.264 High Profile / Level 4.1\n\n",
+        "\nBlending Softcopy Presentation State Storage\n"
+        "  UID          1.2.840.10008.5.1.4.1.1.11.4\n"
+        "  Object type  CSPS\n"
+        "  Template     Lossless\n"
+        "  Offered      yes\n"
+        "  Transfer syntaxes: 0 of 4 enabled\n\n",
+        "\nRT Plan Storage\n  UID          1.2.840.10008.5.1.4.1.1.481.5\n"
+        "  Object type  IMAGE\n  Template     (numbers)\n",
+    };
+    for (const char* expected : kExpected) {
+        EXPECT_NE(sop.out.find(expected), std::string::npos) << expected << "\n--- in ---\n"
+                                                             << sop.out;
+    }
+    const ToolRun missing = configctl(server + " sop Absent");
+    EXPECT_EQ(missing.status, 1);
+}
+
 TEST(Configctl, OptionsAndHelp) {
     const ToolOptions options =
         ToolOptions::parse({"--server=10.0.0.1:81", "get", "--host", "Orvel1", "Doc", "--master"});
