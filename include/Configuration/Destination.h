@@ -20,6 +20,8 @@ class CONFIGURATION_API Destination : public virtual Vesk::Serializable {
 public:
     // The export destination's name (by value; note the capital initial).
     ACE_CString GetDestinationName() const { return m_destinationName; }
+    // The export destination's name, without a copy.
+    const ACE_CString& getDestinationName() const { return m_destinationName; }
     void setDestinationName(const ACE_CString& name) { m_destinationName = name; }
     // Whether storage commitment is required, as configured.
     const ACE_CString& getIsStorageCommitRequired() const { return m_storageCommitRequired; }

@@ -10,6 +10,8 @@
 #include "Configuration/HttpConfigurationClient.h"
 #include "Configuration/SOPServiceConfiguration.h"
 #include "Configuration/StoredForm.h"
+#include "DicomSite.h"
+#include "DicomSiteReport.h"
 #include "Quorvex/BDateTime.h"
 #include "SopServiceReport.h"
 #include "Vesk/XmlUtils.h"
@@ -44,6 +46,8 @@ Commands::~Commands() = default;
 void Commands::run() {
     using Command = void (Commands::*)();
     static const std::map<std::string, Command> commands = {
+        {"check", &Commands::check},
+        {"dicom-nodes", &Commands::dicomNodes},
         {"hosts", &Commands::hosts},
         {"items", &Commands::items},
         {"get", &Commands::get},
@@ -192,6 +196,47 @@ void Commands::sopServices() {
         m_out << "(incomplete: the document lacks required keys or holds unreadable entries)\n";
     }
     printSopServices(config, m_out);
+}
+
+// Site-wide documents live under the master's name, per-machine ones under --host.
+void Commands::loadDicomSite(DicomSite& site) {
+    const ACE_CString machine = host();
+    ACE_CString master = client().masterHostName();
+    if (master.empty()) {
+        master = client().hostName();
+    }
+    site.load([&](const Configuration::ConfigDoc& document, Vesk::Element& tree) {
+        const ACE_CString& owner = document.isLocal() ? machine : master;
+        bool found = false;
+        client().checkForExistence(owner, document.path(), found);
+        if (!found) {
+            return false;
+        }
+        Quorvex::ByteArray bytes;
+        std::size_t length = 0;
+        client().retrieve(owner, document.path(), bytes, length);
+        Configuration::StoredForm::decode(bytes.get(), length, tree);
+        return true;
+    });
+}
+
+void Commands::dicomNodes() {
+    expectArguments(0, 0, "dicom-nodes [--host NAME]");
+    DicomSite site;
+    loadDicomSite(site);
+    printDicomNodes(site, m_out);
+}
+
+void Commands::check() {
+    expectArguments(0, 0, "check [--host NAME]");
+    DicomSite site;
+    loadDicomSite(site);
+    const std::vector<SiteProblem> problems = checkSite(site);
+    printSiteCheck(site, problems, m_out);
+    if (!problems.empty()) {
+        m_out.flush();
+        throw CheckFailed(std::to_string(problems.size()) + " mistakes in the DICOM documents");
+    }
 }
 
 }  // namespace Configctl

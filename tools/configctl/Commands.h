@@ -16,6 +16,8 @@ class HttpConfigurationClient;
 
 namespace Configctl {
 
+struct DicomSite;
+
 class Commands {
 public:
     Commands(const ToolOptions& options, std::ostream& out);
@@ -41,6 +43,9 @@ private:
     void unregisterService();
     void info();
     void whoami();
+    void dicomNodes();
+    void check();
+    void loadDicomSite(DicomSite& site);
     void sopServices();
 
     const ToolOptions& m_options;

@@ -5,6 +5,7 @@
 #include <string>
 
 #include "Commands.h"
+#include "SiteCheck.h"
 #include "ToolOptions.h"
 
 int main(int argc, char** argv) {
@@ -20,6 +21,10 @@ int main(int argc, char** argv) {
         }
         Configctl::Commands(options, std::cout).run();
         return 0;
+    } catch (const Configctl::CheckFailed& e) {
+        std::cout.flush();
+        std::cerr << "configctl: " << e.what() << "\n";
+        return 2;
     } catch (const std::exception& e) {
         std::string message = e.what();
         while (!message.empty() && (message.back() == '\n' || message.back() == '\r')) {
