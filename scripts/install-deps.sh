@@ -6,7 +6,7 @@ set -euo pipefail
 PACKAGES=(
   build-essential cmake pkg-config git
   libace-dev zlib1g-dev libpugixml-dev libcurl4-openssl-dev libssl-dev openssl
-  libcpp-httplib-dev libhowardhinnant-date-dev
+  libcpp-httplib-dev libhowardhinnant-date-dev libboost-dev
   libgtest-dev libgmock-dev libbenchmark-dev
   clang libclang-rt-14-dev clang-format
   libdcmtk-dev

@@ -1,18 +1,15 @@
 // ConfigurationServer: one configuration-service instance: its directory store, its road to the
-// master, its change event and the HTTP server (cpp-httplib, a pool of worker threads, keep-alive)
-// that answers POST /Sundrel/ConfigurationService/ConfigurationService.ashx. Bodies above the
-// configured limit are refused with HTTP 413. Owns everything it uses. run() blocks the calling
-// thread; stop() may be called from any thread (for example a signal-watching one).
+// master, its change event and its HTTP front (HttpFront) that answers POST
+// /Sundrel/ConfigurationService/ConfigurationService.ashx. Owns everything it uses. run() blocks
+// the calling thread; stop() may be called from any thread (for example a signal-watching one).
 #pragma once
 
+#include <cstddef>
 #include <memory>
 #include <string>
 
+#include "RequestRouting.h"
 #include "ServiceOptions.h"
-
-namespace httplib {
-class Server;
-}
 
 namespace Configuration {
 class DirectoryStore;
@@ -21,6 +18,7 @@ class DirectoryStore;
 namespace ConfigurationService {
 
 class ChangeNotifier;
+class HttpFront;
 class MasterLink;
 class RequestDispatcher;
 class TicketCheck;
@@ -28,7 +26,7 @@ struct ServiceContext;
 
 class ConfigurationServer {
 public:
-    static constexpr const char* kPath = "/Sundrel/ConfigurationService/ConfigurationService.ashx";
+    static constexpr const char* kPath = RequestRouting::kServicePath;
 
     // Opens the store (locking its directory) and the change event and binds the listening
     // socket; requests carrying serviceTicket are accepted. Throws std::runtime_error on failure.
@@ -47,19 +45,17 @@ public:
     bool running() const;
     // The store (for tests and tools in the same process).
     Configuration::DirectoryStore& store() { return *m_store; }
+    // Client connections open now.
+    std::size_t openConnections() const;
 
 private:
-    void configureHttp(const ServiceOptions& options);
-    void bindSocket(const ServiceOptions& options);
-
     std::unique_ptr<Configuration::DirectoryStore> m_store;
     std::unique_ptr<MasterLink> m_master;
     std::unique_ptr<ChangeNotifier> m_changes;
     std::unique_ptr<ServiceContext> m_context;
     std::unique_ptr<TicketCheck> m_tickets;
     std::unique_ptr<RequestDispatcher> m_dispatcher;
-    std::unique_ptr<httplib::Server> m_http;
-    int m_listenFd = -1;
+    std::unique_ptr<HttpFront> m_front;
     int m_port = 0;
 };
 

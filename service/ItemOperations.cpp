@@ -125,7 +125,7 @@ Reply ItemOperations::retrieve(const Request& request) {
 Reply ItemOperations::retrieveItems(const Request& request) {
     const std::string& host = request.required("Host");
     const std::string& names = request.required("ConfigurationName");
-    return Reply{200, StoredDocuments::collect(m_context.store, host, names, kNameSeparator)};
+    return Reply{200, StoredDocuments::collect(m_context.store, host, names, kNameSeparators)};
 }
 
 Reply ItemOperations::exists(const Request& request) {

@@ -14,8 +14,8 @@ namespace ConfigurationService {
 
 class ItemOperations {
 public:
-    // Separator of the names in a "RetrieveItems" request.
-    static constexpr char kNameSeparator = ';';
+    // Separators of the names in a "RetrieveItems" request (either one).
+    static constexpr const char* kNameSeparators = ";,";
 
     explicit ItemOperations(ServiceContext& context) : m_context(context) {}
     // Adds the operations to the table.

@@ -1,10 +1,15 @@
 // Request bodies parsed with pugixml.
 #include "Request.h"
 
+#include <algorithm>
 #include <pugixml.hpp>
 
 namespace ConfigurationService {
 namespace {
+
+// A request holds a root and a few parameters; more markup than this is refused before parsing,
+// which keeps the parsed tree of any body a small fraction of the body's own size.
+constexpr std::size_t kMaxMarkup = 1024;
 
 // The text of a parameter element; nested elements are refused.
 std::string textOf(const pugi::xml_node& node) {
@@ -24,6 +29,10 @@ std::string textOf(const pugi::xml_node& node) {
 }  // namespace
 
 Request Request::parse(std::string& body) {
+    if (static_cast<std::size_t>(std::count(body.begin(), body.end(), '<')) > kMaxMarkup) {
+        throw BadRequest("the request holds more than " + std::to_string(kMaxMarkup) +
+                         " tags; a request is one element with a few parameters");
+    }
     pugi::xml_document document;
     const unsigned options = pugi::parse_default & ~pugi::parse_eol;
     const pugi::xml_parse_result result =

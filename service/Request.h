@@ -13,7 +13,7 @@ namespace ConfigurationService {
 class Request {
 public:
     // Parses body (which it may modify); throws BadRequest when it is not well-formed XML with
-    // one root element whose children hold only text.
+    // one root element whose children hold only text, or holds more than 1024 tags.
     static Request parse(std::string& body);
 
     // The root element's name.

@@ -43,9 +43,32 @@ const std::map<std::string, Setter>& setters() {
              o.maxBodyBytes =
                  static_cast<std::size_t>(parseNumber("--max-body-bytes", v, 1024, 1L << 31));
          }},
+        {"--max-body-memory",
+         [](ServiceOptions& o, const std::string& v) {
+             o.maxBodyMemory =
+                 static_cast<std::size_t>(parseNumber("--max-body-memory", v, 1024, 1L << 40));
+         }},
+        {"--io-threads",
+         [](ServiceOptions& o, const std::string& v) {
+             o.ioThreads = static_cast<int>(parseNumber("--io-threads", v, 1, 64));
+         }},
         {"--threads",
          [](ServiceOptions& o, const std::string& v) {
              o.threads = static_cast<int>(parseNumber("--threads", v, 1, 1024));
+         }},
+        {"--request-timeout",
+         [](ServiceOptions& o, const std::string& v) {
+             o.requestTimeoutSeconds =
+                 static_cast<int>(parseNumber("--request-timeout", v, 1, 3600));
+         }},
+        {"--max-connections",
+         [](ServiceOptions& o, const std::string& v) {
+             o.maxConnections = static_cast<int>(parseNumber("--max-connections", v, 1, 1000000));
+         }},
+        {"--max-connections-per-peer",
+         [](ServiceOptions& o, const std::string& v) {
+             o.maxConnectionsPerPeer =
+                 static_cast<int>(parseNumber("--max-connections-per-peer", v, 1, 1000000));
          }},
         {"--keep-alive",
          [](ServiceOptions& o, const std::string& v) {
@@ -113,9 +136,23 @@ std::string ServiceOptions::usage(const std::string& program) {
            "($QUORVEX_EVENT_DIR)\n"
            "  --max-body-bytes N     larger request bodies are refused with 413 (default "
            "67108864)\n"
-           "  --threads N            worker threads, one per open connection (default 64)\n"
+           "  --max-body-memory N    request bodies held at once, all connections together; a "
+           "body\n"
+           "                         that does not fit gets 503 (default 268435456)\n"
+           "  --io-threads N         threads that serve the sockets (default 2)\n"
+           "  --threads N            worker threads for operations that write or wait "
+           "(default 16)\n"
            "  --keep-alive SECONDS   idle time before a kept-alive connection closes (default "
            "5)\n"
+           "  --request-timeout S    a request head must arrive whole within S seconds of its "
+           "first\n"
+           "                         byte; a body gets S seconds plus one per MiB (default "
+           "10)\n"
+           "  --max-connections N    open connections, all peers together (default 10000)\n"
+           "  --max-connections-per-peer N\n"
+           "                         open connections from one peer address; further ones "
+           "are\n"
+           "                         closed at once (default 256)\n"
            "  --log-level LEVEL      debug, info, warning or error (default info); debug logs "
            "every request\n"
            "  --help                 this text\n"

@@ -19,9 +19,14 @@ struct ServiceOptions {
     std::string masterHostName;  // the master's host name, if known in advance
     std::string eventDirectory;  // sets $QUORVEX_EVENT_DIR for the change event
     std::size_t maxBodyBytes = 64u << 20;
-    int threads = 64;  // worker threads; each serves one connection at a time
-    int keepAliveSeconds = 5;
-    std::string logLevel = "info";  // debug, info, warning or error
+    std::size_t maxBodyMemory = 256u << 20;  // request bodies held at once, all connections
+    int ioThreads = 2;                       // threads that run the sockets (never block)
+    int threads = 16;                        // worker threads for operations that may block
+    int keepAliveSeconds = 5;                // idle time between requests on one connection
+    int requestTimeoutSeconds = 10;          // a whole request head; bodies get more by size
+    int maxConnections = 10000;              // open connections, all peers
+    int maxConnectionsPerPeer = 256;         // open connections from one peer address
+    std::string logLevel = "info";           // debug, info, warning or error
     bool help = false;
 
     // Parses the arguments (without the program name); throws std::invalid_argument with a

@@ -1,6 +1,7 @@
 // Several stored documents inflated, parsed and returned as one element tree.
 #include "StoredDocuments.h"
 
+#include <algorithm>
 #include <vector>
 
 #include "Configuration/StoredForm.h"
@@ -11,11 +12,11 @@
 namespace ConfigurationService {
 namespace {
 
-std::vector<std::string> splitNames(const std::string& names, char separator) {
+std::vector<std::string> splitNames(const std::string& names, const char* separators) {
     std::vector<std::string> parts;
     std::size_t start = 0;
     while (start <= names.size()) {
-        std::size_t end = names.find(separator, start);
+        std::size_t end = names.find_first_of(separators, start);
         if (end == std::string::npos) {
             end = names.size();
         }
@@ -52,18 +53,29 @@ void addDocument(Vesk::MultiElementValue& items, const Configuration::StoredItem
 
 std::string StoredDocuments::collect(const Configuration::DirectoryStore& store,
                                      const std::string& host, const std::string& names,
-                                     char separator) {
-    const std::vector<std::string> wanted = splitNames(names, separator);
+                                     const char* separators) {
+    const std::vector<std::string> wanted = splitNames(names, separators);
     if (wanted.empty()) {
         throw OperationFailed("RetrieveItems names no configuration");
     }
+    std::vector<Configuration::StoredItem> found(wanted.size());
+    const std::string* missing = nullptr;
+    for (std::size_t i = 0; i < wanted.size(); ++i) {
+        if (!store.retrieve(host.c_str(), wanted[i].c_str(), found[i]) && missing == nullptr) {
+            missing = &wanted[i];
+        }
+    }
+    if (missing != nullptr) {
+        const bool noneFound = std::none_of(found.begin(), found.end(),
+                                            [](const auto& item) { return item.bytes != nullptr; });
+        if (noneFound) {
+            return std::string();  // the client's "empty response"
+        }
+        throw OperationFailed::notFound(host, *missing);
+    }
     Vesk::Element root("ConfigurationItems");
     Vesk::MultiElementValue& items = root.addMultiElement();
-    for (const std::string& name : wanted) {
-        Configuration::StoredItem item;
-        if (!store.retrieve(host.c_str(), name.c_str(), item)) {
-            throw OperationFailed::notFound(host, name);
-        }
+    for (const Configuration::StoredItem& item : found) {
         addDocument(items, item);
     }
     return Vesk::XmlUtils::toString(root);

@@ -1,7 +1,9 @@
 // configuration-service: one per-machine configuration service in the foreground.
 #include <ace/Log_Msg.h>
+#include <malloc.h>
 #include <pthread.h>
 #include <signal.h>
+#include <sys/resource.h>
 
 #include <cstdio>
 #include <cstdlib>
@@ -39,6 +41,18 @@ void writePortFile(const std::string& path, int port) {
     if (std::rename(temp.c_str(), path.c_str()) != 0) {
         throw std::runtime_error("cannot write the port file " + path);
     }
+}
+
+// Process settings for many connections and large requests: as many descriptors as allowed, and
+// large blocks (request bodies, answers, parsed documents) taken from and given back to the
+// system directly instead of staying in the allocator's heap after use.
+void prepareProcess() {
+    rlimit files{};
+    if (::getrlimit(RLIMIT_NOFILE, &files) == 0 && files.rlim_cur < files.rlim_max) {
+        files.rlim_cur = files.rlim_max;
+        ::setrlimit(RLIMIT_NOFILE, &files);
+    }
+    ::mallopt(M_MMAP_THRESHOLD, 256 * 1024);
 }
 
 int serve(const ServiceOptions& options, const sigset_t& stopSignals) {
@@ -80,6 +94,7 @@ int main(int argc, char** argv) {
         return 0;
     }
     setLogLevel(options.logLevel);
+    prepareProcess();
     // Every thread inherits the blocked stop signals; only the watcher receives them.
     sigset_t stopSignals;
     sigemptyset(&stopSignals);

@@ -79,8 +79,11 @@ TEST_F(ClientAgainstService, MissingDocumentsRaiseTheClientsExceptions) {
     }
     BDateTime time;
     EXPECT_THROW(client.getTimeStamp("h", "Absent", time), HttpConfigurationException);
+    // None of the names exists: an empty answer, which the store access reports as such.
+    EXPECT_EQ(client.retrieveAllConfigurations("h", "Absent,Other").length(), 0u);
+    store("h", "Present", StoredForm::encode(tree("P", "1")));
     try {
-        client.retrieveAllConfigurations("h", "Absent");
+        client.retrieveAllConfigurations("h", "Present;Absent");
         FAIL() << "no exception";
     } catch (const HttpConfigurationException& e) {
         // The path-not-found exception arrives wrapped; its text is kept.

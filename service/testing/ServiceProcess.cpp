@@ -17,10 +17,10 @@ constexpr int kStartAttempts = 400;  // of 25 ms: ten seconds
 constexpr int kStopAttempts = 400;
 
 std::vector<std::string> commandLine(const ServiceProcess::Settings& settings,
-                                     const std::string& portFile) {
-    std::vector<std::string> args = {
-        CONFIGURATION_SERVICE_BINARY, "--port",      "0",    "--port-file", portFile, "--store-dir",
-        settings.storeDirectory,      "--log-level", "error"};
+                                     const std::string& binary, const std::string& portFile) {
+    std::vector<std::string> args = {binary.empty() ? CONFIGURATION_SERVICE_BINARY : binary};
+    args.insert(args.end(), {"--port", "0", "--port-file", portFile, "--store-dir",
+                             settings.storeDirectory, "--log-level", "error"});
     if (!settings.hostName.empty()) {
         args.insert(args.end(), {"--host-name", settings.hostName});
     }
@@ -42,10 +42,10 @@ int readPort(const std::string& path) {
 
 }  // namespace
 
-ServiceProcess::ServiceProcess(const Settings& settings)
+ServiceProcess::ServiceProcess(const Settings& settings, const std::string& binary)
     : m_portFile(settings.storeDirectory + ".port") {
     ::unlink(m_portFile.c_str());
-    const std::vector<std::string> args = commandLine(settings, m_portFile);
+    const std::vector<std::string> args = commandLine(settings, binary, m_portFile);
     std::vector<char*> argv;
     for (const std::string& arg : args) {
         argv.push_back(const_cast<char*>(arg.c_str()));

@@ -21,8 +21,9 @@ public:
         std::vector<std::string> extraArguments;
     };
 
-    // Starts the service; throws std::runtime_error when it does not come up in time.
-    explicit ServiceProcess(const Settings& settings);
+    // Starts the service (binary: another executable than this build's); throws
+    // std::runtime_error when it does not come up in time.
+    explicit ServiceProcess(const Settings& settings, const std::string& binary = std::string());
     ~ServiceProcess();
     ServiceProcess(const ServiceProcess&) = delete;
     ServiceProcess& operator=(const ServiceProcess&) = delete;

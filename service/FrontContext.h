@@ -1,0 +1,33 @@
+// FrontContext: what every connection of the HTTP front shares: the limits, the ticket check
+// and the dispatcher that answers bodies, the worker pool for operations that may block, and the
+// connection and body-memory accounts. Owned by HttpFront, which outlives its connections. The
+// members are thread-safe.
+#pragma once
+
+#include <boost/asio/thread_pool.hpp>
+#include <chrono>
+#include <cstddef>
+
+#include "BodyBudget.h"
+#include "PeerLimiter.h"
+#include "RequestDispatcher.h"
+#include "TicketCheck.h"
+
+namespace ConfigurationService {
+
+struct FrontLimits {
+    std::size_t maxBodyBytes = 0;
+    std::chrono::seconds keepAlive{5};        // idle time between requests
+    std::chrono::seconds requestTimeout{10};  // a whole head; bodies and answers get more by size
+};
+
+struct FrontContext {
+    FrontLimits limits;
+    const TicketCheck& tickets;
+    const RequestDispatcher& dispatcher;
+    boost::asio::thread_pool& workers;
+    PeerLimiter& peers;
+    BodyBudget& bodies;
+};
+
+}  // namespace ConfigurationService
