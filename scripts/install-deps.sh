@@ -11,6 +11,7 @@ PACKAGES=(
   clang libclang-rt-14-dev clang-format
   libdcmtk-dev
   curl wrk etcd-server python3
+  graphviz
 )
 
 missing=()

@@ -14,6 +14,7 @@
 #include "DicomSiteReport.h"
 #include "Quorvex/BDateTime.h"
 #include "SopServiceReport.h"
+#include "StorageTopologyReport.h"
 #include "Vesk/XmlUtils.h"
 
 namespace Configctl {
@@ -59,6 +60,8 @@ void Commands::run() {
         {"info", &Commands::info},
         {"whoami", &Commands::whoami},
         {"sop", &Commands::sopServices},
+        {"topology", &Commands::topology},
+        {"archive", &Commands::archive},
     };
     auto found = commands.find(m_options.command);
     if (found != commands.end()) {
@@ -126,6 +129,7 @@ void Commands::get() {
     client().retrieve(host(), m_options.arguments[0].c_str(), bytes, length);
     Vesk::Element tree;
     Configuration::StoredForm::decode(bytes.get(), length, tree);
+    maskCredentials(tree);
     m_out << pretty(tree);
 }
 

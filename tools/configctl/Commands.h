@@ -47,6 +47,8 @@ private:
     void check();
     void loadDicomSite(DicomSite& site);
     void sopServices();
+    void topology();
+    void archive();
 
     const ToolOptions& m_options;
     std::ostream& m_out;

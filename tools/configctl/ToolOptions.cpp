@@ -48,6 +48,8 @@ ToolOptions ToolOptions::parse(const std::vector<std::string>& args) {
             options.help = true;
         } else if (arg == "--https") {
             options.https = true;
+        } else if (arg == "--dot") {
+            options.dot = true;
         } else if (arg == "--master") {
             options.viaMaster = true;
         } else if (takeValue(args, i, "--server", value)) {
@@ -94,13 +96,20 @@ std::string ToolOptions::usage() {
            "  whoami                      print the service's host name and its master's\n"
            "  sop [NAME]                  print the SOP service document (default\n"
            "                              BrimmetServer\\SOPServiceConfiguration) resolved: per\n"
-           "                              service the transfer syntaxes it accepts\n\n"
+           "                              service the transfer syntaxes it accepts\n"
+           "  topology [--dot]            print the storage topology: each location's chain as\n"
+           "                              stored and resolved to stacks, the stacks, targets, "
+           "cache\n"
+           "                              and tape servers; --dot: as a Graphviz graph\n"
+           "                              (configctl topology --dot | dot -Tsvg > site.svg)\n"
+           "  archive                     print the tape archive (passwords masked)\n\n"
            "Options:\n"
            "  --server HOST:PORT  the configuration service (default $QUORVEX_CONFIGURATION_SERVER"
            " or 127.0.0.1:8771)\n"
            "  --host NAME         the host the documents belong to (default: the service's own)\n"
            "  --master            put: store through StoreMaster (reaches the master)\n"
            "  --module-type N     hosts: only hosts that registered a module of type N\n"
+           "  --dot               topology: print a Graphviz graph\n"
            "  --https             talk TLS\n"
            "  --help              this text\n\n"
            "The machine's service ticket is sent as cookie OrvelWebApplication. On failure the "

@@ -16,6 +16,7 @@ struct ToolOptions {
     bool https = false;
     bool viaMaster = false;  // put: "StoreMaster" instead of "Store"
     int moduleType = -1;     // hosts: only hosts running this module type (-1: all)
+    bool dot = false;        // topology: a Graphviz graph instead of text
     bool help = false;
     std::string command;
     std::vector<std::string> arguments;
