@@ -7,6 +7,7 @@
 #pragma once
 
 #include <ostream>
+#include <string>
 
 #include "Configuration/KelArchiveConfiguration.h"
 #include "Configuration/LocationConfiguration.h"
