@@ -7,6 +7,8 @@
 //     element io("KelExportRemoteSCPs", Fields::wrapped("KelExportRemoteScp", self.m_list,
 //                                               Fields::DropFailed));
 //     io("PersistentTargets", Fields::pairs(self.m_targets, "Persistent", "Mirror"));
+//     io("Archives", Fields::required(...));   // absent: a logged failure that ends the read
+//     io("RemoteScp", Fields::basePart<RemoteSCPConfiguration>(self));  // the base's own part
 // A plain field is, by its type: a scalar (string, flag, number, enumeration as its number, date,
 // time, date-time) in a single-valued child; a configuration class in a nested child; a container
 // of either as repeated children with the field's key (items kept when incomplete, the list
