@@ -20,6 +20,7 @@ namespace net = boost::asio;
 using net::ip::tcp;
 
 constexpr int kListenBacklog = 1024;
+constexpr int kAcceptBurst = 64;                       // connections taken from the backlog at once
 constexpr std::chrono::milliseconds kAcceptPause{50};  // after running out of descriptors
 
 FrontLimits limitsOf(const ServiceOptions& options) {
@@ -47,6 +48,7 @@ struct HttpFront::State {
     static std::vector<std::unique_ptr<net::io_context>> makeContexts(int count);
     void listen(const ServiceOptions& options);
     void accept();
+    void acceptWaiting();
     void admit(tcp::socket socket);
     static void serve(net::io_context& context);
 
@@ -90,6 +92,9 @@ void HttpFront::State::listen(const ServiceOptions& options) {
         acceptor.listen(kListenBacklog, error);
     }
     if (!error) {
+        acceptor.non_blocking(true, error);  // acceptWaiting() never blocks
+    }
+    if (!error) {
         port = acceptor.local_endpoint(error).port();
     }
     if (error) {
@@ -105,6 +110,7 @@ void HttpFront::State::accept() {
         }
         if (!error) {
             admit(std::move(socket));
+            acceptWaiting();
             accept();
             return;
         }
@@ -112,6 +118,19 @@ void HttpFront::State::accept() {
         pause.expires_after(kAcceptPause);
         pause.async_wait([this](boost::system::error_code) { accept(); });
     });
+}
+
+// Takes the connections already waiting in the backlog without another round through the loop.
+void HttpFront::State::acceptWaiting() {
+    for (int i = 0; i < kAcceptBurst; ++i) {
+        boost::system::error_code error;
+        tcp::socket socket(*io.front());
+        acceptor.accept(socket, error);
+        if (error) {
+            return;
+        }
+        admit(std::move(socket));
+    }
 }
 
 // Admits a new connection within the caps and hands it to the next socket thread; one over a

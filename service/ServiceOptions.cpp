@@ -139,7 +139,7 @@ std::string ServiceOptions::usage(const std::string& program) {
            "  --max-body-memory N    request bodies held at once, all connections together; a "
            "body\n"
            "                         that does not fit gets 503 (default 268435456)\n"
-           "  --io-threads N         threads that serve the sockets (default 2)\n"
+           "  --io-threads N         threads that serve the sockets (default 4)\n"
            "  --threads N            worker threads for operations that write or wait "
            "(default 16)\n"
            "  --keep-alive SECONDS   idle time before a kept-alive connection closes (default "

@@ -20,7 +20,7 @@ struct ServiceOptions {
     std::string eventDirectory;  // sets $QUORVEX_EVENT_DIR for the change event
     std::size_t maxBodyBytes = 64u << 20;
     std::size_t maxBodyMemory = 256u << 20;  // request bodies held at once, all connections
-    int ioThreads = 2;                       // threads that run the sockets (never block)
+    int ioThreads = 4;                       // threads that run the sockets (never block)
     int threads = 16;                        // worker threads for operations that may block
     int keepAliveSeconds = 5;                // idle time between requests on one connection
     int requestTimeoutSeconds = 10;          // a whole request head; bodies get more by size
