@@ -12,16 +12,23 @@
 #include "Configuration/AutoExportConfiguration.h"
 #include "Configuration/DMWLTarget.h"
 #include "Configuration/DicomClientConfiguration.h"
+#include "Configuration/KelArchiveConfiguration.h"
 #include "Configuration/KelExportConfigurationAdapter.h"
 #include "Configuration/KelExportLocalConfiguration.h"
 #include "Configuration/KelExportRemoteConfigurations.h"
 #include "Configuration/KelExportWebService.h"
 #include "Configuration/KelQueryConfiguration.h"
+#include "Configuration/LegacyMirrorStackMapping.h"
+#include "Configuration/LocationConfiguration.h"
+#include "Configuration/LocationMigrationChain.h"
+#include "Configuration/MSMQConfiguration.h"
 #include "Configuration/OrvelSystemConfiguration.h"
 #include "Configuration/QrscpConfiguration.h"
+#include "Configuration/RulesConfiguration.h"
 #include "Configuration/SOPServiceConfiguration.h"
 #include "Configuration/SSCPConfiguration.h"
 #include "Configuration/StorageCommitConfiguration.h"
+#include "Configuration/StrategyConfiguration.h"
 #include "ConventionSample.h"
 #include "Vesk/XmlUtils.h"
 
@@ -101,6 +108,23 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     readWriteRead<Configuration::KelQueryRemoteSCPConfiguration>(tree);
     readWriteRead<Configuration::PrefetchConfiguration__>(tree);
     readWriteRead<Configuration::KelQueryConfiguration>(tree);
+    readWriteRead<Configuration::MSMQConfiguration>(tree);
+    readWriteRead<Configuration::LegacyMirrorStackMapping>(tree);
+    readWriteRead<Configuration::Strategy>(tree);
+    readWriteRead<Configuration::StrategyStack>(tree);
+    readWriteRead<Configuration::StrategyConfiguration>(tree);
+    readWriteRead<Configuration::MigrationRule>(tree);
+    readWriteRead<Configuration::RegistrationRule>(tree);
+    readWriteRead<Configuration::LocationMigrationFilter>(tree);
+    readWriteRead<Configuration::LocationMigrationChain>(tree);
+    readWriteRead<Configuration::RulesConfiguration>(tree);
+    readWriteRead<Configuration::TivoliServerInfo>(tree);
+    readWriteRead<Configuration::TivoliNodeInfo>(tree);
+    readWriteRead<Configuration::ArchiveLocalNodeInfo>(tree);
+    readWriteRead<Configuration::ArchiveNodeStackInfo>(tree);
+    readWriteRead<Configuration::KelArchiveConfiguration>(tree);
+    readWriteRead<Configuration::LocationProfile>(tree);
+    readWriteRead<Configuration::LocationConfiguration>(tree);
     readWriteRead<Configuration::Testing::Convention>(tree);
     return 0;
 }
