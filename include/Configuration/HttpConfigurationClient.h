@@ -23,6 +23,10 @@
 
 #include "Configuration/Export.h"
 #include "Configuration/HttpConfigurationItemInfo.h"
+#include "Configuration/SmartPtr.h"
+#include "Configuration/UwfContactNameData.h"
+#include "Configuration/UwfNodeData.h"
+#include "Configuration/UwfUserData.h"
 #include "Quorvex/auto_ptr.h"
 
 class BDateTime;
@@ -116,6 +120,57 @@ public:
     void switchoverPersistent(const ACE_CString& persistentName) const;
     // Turns network capture merging on or off for a host.
     void enableMergeNetworkCapture(bool enable, const ACE_CString& host) const;
+    // User-workflow operations: each sends <Message><Operation>parameters</Operation></Message>
+    // (empty parameters left out) and judges the answer by HTTP status and error record, so a
+    // removed node, a missing preference path and the folder and item limits arrive as their own
+    // exception classes. Vectors are appended to, in answer order.
+
+    // Creates a node; returns its id and sets lastModified to the service's time of the change.
+    ACE_CString UwfCreateNode(const UwfNodeData& node, BDateTime& lastModified) const;
+    // Updates a node; returns the service's time of the change.
+    BDateTime UwfUpdateNode(const UwfNodeData& node) const;
+    // Deletes a node (a folder with everything under it).
+    void UwfDeleteNode(const ACE_CString& nodeId, const ACE_CString& userId,
+                       UwfNodeData::NodeType type) const;
+    // Puts an exam into a folder.
+    void UwfInsertExamFolder(const ACE_CString& examKey, const ACE_CString& folderId) const;
+    // Takes an exam out of a folder.
+    void UwfDeleteExamFolder(const ACE_CString& examKey, const ACE_CString& folderId) const;
+    // Whether an exam is in any folder.
+    bool UwfIsProtectedExam(const ACE_CString& examKey) const;
+    // Whether a node of that type (and id, if it exists) may live under parentId.
+    bool UwfIsValidChild(const ACE_CString& id, const ACE_CString& parentId,
+                         UwfNodeData::NodeType type) const;
+    // Keeps the newest itemsToRetain items of a folder and deletes the others.
+    void UwfPurgeFolder(const ACE_CString& folderId, int itemsToRetain,
+                        const ACE_CString& userId) const;
+    // Fills user with the service's record of the user.
+    void UwfGetUserStatus(const ACE_CString& userId, UwfUserData& user) const;
+    // Stores a user's record (name, type, folders, on-call flag).
+    void UwfUpdateUserStatus(const UwfUserData& user) const;
+    // Logs a user out.
+    void UwfLogoutUser(const ACE_CString& userId) const;
+    // Deletes a user with the user's folders, contact name and preferences.
+    void UwfDeleteUser(const ACE_CString& userId) const;
+    // Sets contactName to a new record with the user's contact name.
+    void UwfGetContactNameData(const ACE_CString& userId,
+                               SmartPtr<UwfContactNameData>& contactName) const;
+    // Stores a user's preference under path.
+    void UwfStorePreference(const ACE_CString& userId, const ACE_CString& path,
+                            const ACE_CString& data) const;
+    // A user's preference under path.
+    ACE_CString UwfRetrievePreference(const ACE_CString& userId, const ACE_CString& path) const;
+    // The preferences of the users (ids separated by ","), as the service's text.
+    ACE_CString UwfRetrieveAllPreferences(const ACE_CString& userIds) const;
+    // Appends the nodes of a folder changed after modifiedSince.
+    void UwfGetFolderData(const ACE_CString& folderId, const BDateTime& modifiedSince,
+                          std::vector<SmartPtr<UwfNodeData>>& nodes) const;
+    // Logs a user in; appends the user's root folders.
+    void UwfLoginUser(const UwfUserData& user, std::vector<SmartPtr<UwfNodeData>>& nodes) const;
+    // Appends the users of a type (all types when empty), only logged-in ones if asked.
+    void UwfListUsers(const ACE_CString& type, bool loggedInOnly,
+                      std::vector<SmartPtr<UwfUserData>>& users) const;
+
     // Tells the service that this machine changed the configuration.
     void signalChanged() const;
     // Asks the service to restart.
@@ -141,6 +196,7 @@ private:
     ACE_CString retrieveMasterHostName(const ACE_CString& server) const;
     ACE_CString sendConfiguration(const ACE_CString& body) const;
     void collectHostNames(const ACE_CString& body, std::vector<ACE_CString>& hosts) const;
+    ACE_CString sendWorkflow(const ACE_CString& body) const;
 
     ACE_CString m_configurationUrl;
     ACE_CString m_workflowUrl;
