@@ -6,7 +6,6 @@
 
 #include <fstream>
 #include <map>
-#include <regex>
 #include <sstream>
 #include <string>
 
@@ -27,18 +26,33 @@ std::string fileText(const std::string& path) {
     return text.str();
 }
 
+// Adds the UID of a line "#define UID_<name> "<uid>"" (a literal UID only) to uids.
+void addDefinedUid(const std::string& line, std::map<std::string, std::string>& uids) {
+    const std::string prefix = "#define UID_";
+    if (line.compare(0, prefix.size(), prefix) != 0) {
+        return;
+    }
+    const std::size_t nameEnd = line.find_first_of(" \t", prefix.size());
+    const std::size_t open = line.find_first_not_of(" \t", nameEnd);
+    if (nameEnd == std::string::npos || open == std::string::npos || line[open] != '"') {
+        return;
+    }
+    const std::size_t close = line.find('"', open + 1);
+    const std::string uid = line.substr(open + 1, close - open - 1);
+    if (close != std::string::npos && !uid.empty() &&
+        uid.find_first_not_of("0123456789.") == std::string::npos) {
+        uids[uid] = line.substr(prefix.size(), nameEnd - prefix.size());
+    }
+}
+
 // UID to its name in the standard's table.
 const std::map<std::string, std::string>& standardUids() {
     static const std::map<std::string, std::string> table = [] {
         std::map<std::string, std::string> uids;
         std::ifstream installed(kInstalledTable);
         if (installed) {
-            const std::regex define(R"re(#define UID_(\w+)\s+"([0-9.]+)")re");
-            std::smatch match;
             for (std::string line; std::getline(installed, line);) {
-                if (std::regex_search(line, match, define)) {
-                    uids[match[2]] = match[1];
-                }
+                addDefinedUid(line, uids);
             }
             return uids;
         }
