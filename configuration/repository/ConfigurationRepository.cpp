@@ -194,7 +194,16 @@ void ConfigurationRepository::keep(const ACE_CString& path,
 
 int ConfigurationRepository::Store(ConfigDoc& document) {
     const ACE_CString host = document.isLocal() ? m_virtualHostName : GetMasterHostName();
-    Quorvex::auto_ptr<Vesk::Element> tree = WriteItem(host, document);
+    Quorvex::auto_ptr<Vesk::Element> tree;
+    try {
+        tree = WriteItem(host, document);
+    } catch (const std::exception& e) {  // a read-only class refuses to be written
+        QUORVEX_LOG(LM_ERROR,
+                    "ConfigurationRepository::Store: Unable to write %s. Standard Exception: "
+                    "%s\n",
+                    document.path().c_str(), e.what());
+        return -1;
+    }
     if (!tree) {
         return -1;
     }

@@ -167,6 +167,36 @@ TEST_F(RepositoryTest, ClassesNamingTheSameDocumentAreAllServedFromTheCache) {
     EXPECT_EQ(local.retrieves, 1);
 }
 
+// A document class that refuses to be written, as the read-only classes do.
+class ReadOnly : public TypedConfigDoc<ReadOnly> {
+    CONFIGURATION_CLASS(ReadOnly);
+
+public:
+    ReadOnly() : TypedConfigDoc(ConfigDoc::getConfigurationRegistryPath() + "TestDoc", false) {}
+    ACE_CString name;
+};
+
+template <class Self, class Io>
+void ReadOnly::fields(Self& self, Io& io) {
+    io("Name", self.name);
+}
+
+CONFIGURATION_DEFINE_READ(ReadOnly, Fields::FailureForm::Failed)
+CONFIGURATION_DEFINE_NO_WRITE(ReadOnly, "ReadOnly::writeVesk - Not supported.")
+CONFIGURATION_DEFINE_EQUAL(ReadOnly)
+
+// Guards against a refused writeVesk escaping Store as an exception.
+TEST_F(RepositoryTest, StoringAReadOnlyDocumentIsMinusOneAndALogLine) {
+    Quorvex::Testing::LogCapture log;
+    ReadOnly document;
+    EXPECT_EQ(repository->Store(document), -1);
+    EXPECT_TRUE(
+        log.containsFragment("ConfigurationRepository::Store: Unable to write "
+                             "BrimmetServer\\TestDoc. Standard Exception: "
+                             "ReadOnly::writeVesk - Not supported."));
+    EXPECT_EQ(master.stores, 0);
+}
+
 TEST_F(RepositoryTest, DocumentMissingAKeyIsAnErrorAndNotCached) {
     Vesk::Element partial("TestDoc", -1);
     partial.addMultiElement().addElement("Name", {}, -1).addSingle().assign("only");
