@@ -13,6 +13,7 @@
 #include <string>
 
 #include "Configuration/AnonParam.h"
+#include "Configuration/ApplicationLocationConfiguration.h"
 #include "Configuration/AutoExportConfiguration.h"
 #include "Configuration/DMWLTarget.h"
 #include "Configuration/DicomClientConfiguration.h"
@@ -26,11 +27,14 @@
 #include "Configuration/LegacyMirrorStackMapping.h"
 #include "Configuration/LocationConfiguration.h"
 #include "Configuration/LocationMigrationChain.h"
+#include "Configuration/OrvelSystemCommonConfiguration.h"
 #include "Configuration/OrvelSystemConfiguration.h"
+#include "Configuration/ProcessesAndServicesConfiguration.h"
 #include "Configuration/QrscpConfiguration.h"
 #include "Configuration/RulesConfiguration.h"
 #include "Configuration/SOPServiceConfiguration.h"
 #include "Configuration/SSCPConfiguration.h"
+#include "Configuration/ServerInfo.h"
 #include "Configuration/StorageCommitConfiguration.h"
 #include "Configuration/StrategyConfiguration.h"
 #include "ElementTestSupport.h"
@@ -50,9 +54,10 @@ struct ClassRow {
     std::set<std::string> optionalKeys;  // keys whose absence does not make the read incomplete
     std::function<std::unique_ptr<Vesk::Serializable>()> make;
     std::function<bool(const Vesk::Serializable&, const Vesk::Serializable&)> equal;
-    bool writes = true;               // false: writeVesk refuses
-    std::string refusal;              // what writeVesk refuses with, when it does
-    std::set<std::string> fatalKeys;  // absent: a logged failure that ends the read
+    bool writes = true;                 // false: writeVesk refuses
+    std::string refusal;                // what writeVesk refuses with, when it does
+    std::set<std::string> fatalKeys;    // absent: a logged failure that ends the read
+    std::set<std::string> emptiedKeys;  // lists whose absence empties a non-empty default
 };
 
 template <class T>
@@ -66,6 +71,7 @@ ClassRow row(const char* name, const char* failureForm, std::set<std::string> op
                     },
                     true,
                     "",
+                    {},
                     {}};
 }
 
@@ -80,6 +86,11 @@ ClassRow readOnlyRow(const char* name, std::set<std::string> optionalKeys = {},
 
 ClassRow withFatalKeys(ClassRow r, std::set<std::string> fatalKeys) {
     r.fatalKeys = std::move(fatalKeys);
+    return r;
+}
+
+ClassRow withEmptiedKeys(ClassRow r, std::set<std::string> emptiedKeys) {
+    r.emptiedKeys = std::move(emptiedKeys);
     return r;
 }
 
@@ -159,6 +170,20 @@ const ClassRow kClasses[] = {
     row<LocationProfile>("LocationProfile", kFailed,
                          {"LocalServers", "CollectIpFilters", "MergeTraceLevels"}),
     row<LocationConfiguration>("LocationConfiguration", kFailed),
+    withEmptiedKeys(row<ProcessesAndServicesConfiguration>("ProcessesAndServicesConfiguration",
+                                                           kFailed, {"ModuleType", "Process"}),
+                    {"Process"}),
+    row<OrvelSystemCommonConfiguration>("OrvelSystemCommonConfiguration", kFailed),
+    row<SolutionDefinition>("SolutionDefinition", kPartialDefaults),
+    row<ProductDefinition>("ProductDefinition", kPartialDefaults),
+    row<ProductDefinitions>("ProductDefinitions", kFailed, {"ProductDefinition"}),
+    row<ApplicationDefinition>("ApplicationDefinition", kPartialDefaults),
+    row<ApplicationDefinitions>("ApplicationDefinitions", kPartialDefaults,
+                                {"ApplicationDefinition"}),
+    row<ApplicationLocationConfiguration>("ApplicationLocationConfiguration", kFailed),
+    row<ServerInfo>("ServerInfo", kFailed,
+                    {"MasterAddress", "Version", "StoreDirectory", "ItemCount",
+                     "RegisteredServices", "StartTime", "UptimeSeconds", "Port"}),
 };
 
 // The children of element with that key, in order.
@@ -274,8 +299,11 @@ TEST_P(ClassSamples, EachMissingKeyKeepsItsDefaultAndTheRestIsRead) {
         }
         const Quorvex::auto_ptr<Vesk::Element> written = object->writeVesk();
         std::size_t expectedCount = 0;
+        Vesk::Element emptied(m_sample.key(), -1);
+        emptied.addMultiElement();
         for (const ACE_CString& key : keys) {
-            const Vesk::Element& expected = key == left ? *defaults : m_sample;
+            const bool empties = key == left && c().emptiedKeys.count(left.c_str()) == 1;
+            const Vesk::Element& expected = empties ? emptied : key == left ? *defaults : m_sample;
             expectedCount += childrenWith(expected, key).size();
             EXPECT_EQ(childrenWith(expected, key), childrenWith(*written, key))
                 << "without " << left.c_str() << ", key " << key.c_str();
