@@ -9,7 +9,7 @@ PACKAGES=(
   libcpp-httplib-dev libhowardhinnant-date-dev libboost-dev
   libgtest-dev libgmock-dev libbenchmark-dev
   clang libclang-rt-14-dev clang-format
-  libdcmtk-dev
+  libdcmtk-dev libsqlite3-dev
   curl wrk etcd-server python3
   graphviz
 )

@@ -7,6 +7,7 @@
 #include "Quorvex/Host.h"
 #include "RequestDispatcher.h"
 #include "TimeText.h"
+#include "workflow/WorkflowDispatcher.h"
 
 namespace ConfigurationService {
 namespace {
@@ -34,12 +35,30 @@ ConfigurationServer::ConfigurationServer(const ServiceOptions& options,
     m_context.reset(new ServiceContext{*m_store, *m_master, *m_changes, hostName});
     m_context->startedMs = TimeText::now();
     m_dispatcher.reset(new RequestDispatcher(*m_context, *m_tickets));
-    m_front.reset(new HttpFront(options, *m_tickets, *m_dispatcher));
+    m_workflow.reset(new Workflow::WorkflowStore(
+        workflowDatabase(options),
+        Workflow::Limits{options.maxFoldersPerUser, options.maxItemsPerFolder}));
+    m_workflowDispatcher.reset(new Workflow::WorkflowDispatcher(*m_workflow, *m_tickets));
+    m_routes.reset(new Routes());
+    m_routes->add(RequestRouting::kServicePath, *m_dispatcher);
+    m_routes->add(Workflow::WorkflowDispatcher::kPath, *m_workflowDispatcher);
+    m_front.reset(new HttpFront(options, *m_tickets, *m_routes));
     m_port = m_front->port();
     m_context->port = m_port;
 }
 
 ConfigurationServer::~ConfigurationServer() = default;
+
+std::string ConfigurationServer::workflowDatabase(const ServiceOptions& options) {
+    if (!options.workflowDatabase.empty()) {
+        return options.workflowDatabase;
+    }
+    std::string store = options.storeDirectory;
+    while (store.size() > 1 && store.back() == '/') {
+        store.pop_back();
+    }
+    return store + ".workflow.sqlite";
+}
 
 bool ConfigurationServer::run() {
     return m_front->run();

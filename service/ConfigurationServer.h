@@ -1,6 +1,7 @@
 // ConfigurationServer: one configuration-service instance: its directory store, its road to the
-// master, its change event and its HTTP front (HttpFront) that answers POST
-// /Sundrel/ConfigurationService/ConfigurationService.ashx. Owns everything it uses. run() blocks
+// master, its change event, its user-workflow database and its HTTP front (HttpFront) that
+// answers POST /Sundrel/ConfigurationService/ConfigurationService.ashx and
+// /Sundrel/UserWorkflowService/UserWorkFlow.ashx. Owns everything it uses. run() blocks
 // the calling thread; stop() may be called from any thread (for example a signal-watching one).
 #pragma once
 
@@ -21,8 +22,13 @@ class ChangeNotifier;
 class HttpFront;
 class MasterLink;
 class RequestDispatcher;
+class Routes;
 class TicketCheck;
 struct ServiceContext;
+namespace Workflow {
+class WorkflowDispatcher;
+class WorkflowStore;
+}  // namespace Workflow
 
 class ConfigurationServer {
 public:
@@ -45,6 +51,10 @@ public:
     bool running() const;
     // The store (for tests and tools in the same process).
     Configuration::DirectoryStore& store() { return *m_store; }
+    // The user-workflow state (for tests and tools in the same process).
+    Workflow::WorkflowStore& workflow() { return *m_workflow; }
+    // The user-workflow database of options: its own option or beside the store.
+    static std::string workflowDatabase(const ServiceOptions& options);
     // Client connections open now.
     std::size_t openConnections() const;
 
@@ -55,6 +65,9 @@ private:
     std::unique_ptr<ServiceContext> m_context;
     std::unique_ptr<TicketCheck> m_tickets;
     std::unique_ptr<RequestDispatcher> m_dispatcher;
+    std::unique_ptr<Workflow::WorkflowStore> m_workflow;
+    std::unique_ptr<Workflow::WorkflowDispatcher> m_workflowDispatcher;
+    std::unique_ptr<Routes> m_routes;
     std::unique_ptr<HttpFront> m_front;
     int m_port = 0;
 };

@@ -1,6 +1,6 @@
 // FrontContext: what every connection of the HTTP front shares: the limits, the ticket check
-// and the dispatcher that answers bodies, the worker pool for operations that may block, and the
-// connection and body-memory accounts. Owned by HttpFront, which outlives its connections. The
+// and the routes whose handlers answer bodies, the worker pool for operations that may block, and
+// the connection and body-memory accounts. Owned by HttpFront, which outlives its connections. The
 // members are thread-safe.
 #pragma once
 
@@ -10,7 +10,7 @@
 
 #include "BodyBudget.h"
 #include "PeerLimiter.h"
-#include "RequestDispatcher.h"
+#include "Routes.h"
 #include "TicketCheck.h"
 
 namespace ConfigurationService {
@@ -24,7 +24,7 @@ struct FrontLimits {
 struct FrontContext {
     FrontLimits limits;
     const TicketCheck& tickets;
-    const RequestDispatcher& dispatcher;
+    const Routes& routes;
     boost::asio::thread_pool& workers;
     PeerLimiter& peers;
     BodyBudget& bodies;

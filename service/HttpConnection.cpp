@@ -61,7 +61,7 @@ bool expectsContinue(const http::fields& head) {
 }
 
 // Runs one request; every failure becomes an answer.
-Reply dispatch(const RequestDispatcher& dispatcher, std::string& body,
+Reply dispatch(const RouteHandler& dispatcher, std::string& body,
                const std::vector<std::string>& cookies, const std::string& peer) {
     try {
         return dispatcher.dispatch(body, cookies, peer);
@@ -165,9 +165,9 @@ bool HttpConnection::admitBody() {
     m_keepAlive = head.keep_alive();
     const bool bodyPending = !m_parser->is_done();
     const std::string target(head.target().data(), head.target().size());
-    if (RequestRouting::path(target) != RequestRouting::kServicePath) {
-        refuse(404, std::string("no such service path; POST to ") + RequestRouting::kServicePath,
-               bodyPending);
+    m_route = m_front.routes.find(RequestRouting::path(target));
+    if (m_route == nullptr) {
+        refuse(404, "no such service path; POST to " + m_front.routes.describe(), bodyPending);
         return false;
     }
     if (head.method() != http::verb::post) {
@@ -243,13 +243,14 @@ void HttpConnection::runRequest() {
     std::string body = std::move(request.body());
     std::vector<std::string> cookies = cookiesOf(request);
     m_large = body.size() >= kLargeBytes;
-    if (RequestRouting::isQuick(body)) {
-        answer(dispatch(m_front.dispatcher, body, cookies, m_peer));
+    const RouteHandler& route = *m_route;
+    if (route.isQuick(body)) {
+        answer(dispatch(route, body, cookies, m_peer));
         return;
     }
-    net::post(m_front.workers, [self = shared_from_this(), body = std::move(body),
+    net::post(m_front.workers, [self = shared_from_this(), &route, body = std::move(body),
                                 cookies = std::move(cookies)]() mutable {
-        Reply reply = dispatch(self->m_front.dispatcher, body, cookies, self->m_peer);
+        Reply reply = dispatch(route, body, cookies, self->m_peer);
         std::string().swap(body);
         net::post(self->m_stream.get_executor(),
                   [self, reply = std::move(reply)]() mutable { self->answer(std::move(reply)); });

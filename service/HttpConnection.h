@@ -71,12 +71,13 @@ private:
     PeerLimiter::Slot m_slot;
     BodyBudget::Grant m_grant;
     FrontContext& m_front;
-    std::size_t m_bodyLimit = 0;  // of the request being read
-    unsigned m_version = 11;      // HTTP version of the request being answered
-    bool m_keepAlive = true;      // whether the request being answered lets the connection live
-    bool m_served = false;        // whether a request was answered on this connection
-    bool m_large = false;         // whether the request or its answer was large
-    std::size_t m_drained = 0;    // bytes discarded while closing
+    const RouteHandler* m_route = nullptr;  // of the request being read
+    std::size_t m_bodyLimit = 0;            // of the request being read
+    unsigned m_version = 11;                // HTTP version of the request being answered
+    bool m_keepAlive = true;    // whether the request being answered lets the connection live
+    bool m_served = false;      // whether a request was answered on this connection
+    bool m_large = false;       // whether the request or its answer was large
+    std::size_t m_drained = 0;  // bytes discarded while closing
 };
 
 }  // namespace ConfigurationService

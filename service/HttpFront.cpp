@@ -34,8 +34,7 @@ FrontLimits limitsOf(const ServiceOptions& options) {
 }  // namespace
 
 struct HttpFront::State {
-    State(const ServiceOptions& options, const TicketCheck& tickets,
-          const RequestDispatcher& dispatcher)
+    State(const ServiceOptions& options, const TicketCheck& tickets, const Routes& routes)
         : peers(static_cast<std::size_t>(options.maxConnections),
                 static_cast<std::size_t>(options.maxConnectionsPerPeer)),
           bodies(options.maxBodyMemory),
@@ -43,7 +42,7 @@ struct HttpFront::State {
           acceptor(*io.front()),
           pause(*io.front()),
           workers(static_cast<std::size_t>(options.threads)),
-          context{limitsOf(options), tickets, dispatcher, workers, peers, bodies} {}
+          context{limitsOf(options), tickets, routes, workers, peers, bodies} {}
 
     static std::vector<std::unique_ptr<net::io_context>> makeContexts(int count);
     void listen(const ServiceOptions& options);
@@ -172,8 +171,8 @@ void HttpFront::State::serve(net::io_context& context) {
 }
 
 HttpFront::HttpFront(const ServiceOptions& options, const TicketCheck& tickets,
-                     const RequestDispatcher& dispatcher)
-    : m_state(new State(options, tickets, dispatcher)) {
+                     const Routes& routes)
+    : m_state(new State(options, tickets, routes)) {
     for (auto& context : m_state->io) {
         m_state->busy.push_back(net::make_work_guard(*context));
     }

@@ -2,8 +2,8 @@
 // Boost.Beast: a few socket threads run every connection (an idle or slow connection costs a
 // socket and a small buffer, never a thread), a worker pool runs the operations that may block,
 // and caps on connections per peer, request deadlines and a shared body budget keep slow or
-// hostile peers from starving the others. Answers POST to the service path by handing the body to
-// the RequestDispatcher. Owns its sockets and threads; the ticket check and the dispatcher must
+// hostile peers from starving the others. Answers POST to each path of its Routes by handing the
+// body to that path's handler. Owns its sockets and threads; the ticket check and the routes must
 // outlive it. run() blocks the calling thread; stop(), running() and openConnections() are
 // thread-safe.
 #pragma once
@@ -15,15 +15,14 @@
 
 namespace ConfigurationService {
 
-class RequestDispatcher;
+class Routes;
 class TicketCheck;
 
 class HttpFront {
 public:
     // Binds and listens on the options' address and port; throws std::runtime_error when it
     // cannot.
-    HttpFront(const ServiceOptions& options, const TicketCheck& tickets,
-              const RequestDispatcher& dispatcher);
+    HttpFront(const ServiceOptions& options, const TicketCheck& tickets, const Routes& routes);
     ~HttpFront();
     HttpFront(const HttpFront&) = delete;
     HttpFront& operator=(const HttpFront&) = delete;

@@ -3,6 +3,7 @@
 
 #include "Answer.h"
 #include "Quorvex/Log.h"
+#include "RequestRouting.h"
 
 namespace ConfigurationService {
 namespace {
@@ -58,6 +59,10 @@ Reply RequestDispatcher::dispatch(std::string& body, const std::vector<std::stri
                 describe(request).c_str(), peer.c_str(), reply.status,
                 static_cast<int>(reply.body.size()));
     return reply;
+}
+
+bool RequestDispatcher::isQuick(const std::string& body) const {
+    return RequestRouting::isQuick(body);
 }
 
 Reply RequestDispatcher::run(const Operations::Entry& entry, const Request& request) const {

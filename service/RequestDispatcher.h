@@ -10,13 +10,14 @@
 
 #include "ItemOperations.h"
 #include "Operations.h"
+#include "Routes.h"
 #include "ServiceContext.h"
 #include "SiteOperations.h"
 #include "TicketCheck.h"
 
 namespace ConfigurationService {
 
-class RequestDispatcher {
+class RequestDispatcher : public RouteHandler {
 public:
     RequestDispatcher(ServiceContext& context, const TicketCheck& tickets);
     RequestDispatcher(const RequestDispatcher&) = delete;
@@ -25,7 +26,9 @@ public:
     // The answer to body (which may be modified), sent with the given "Cookie" header values,
     // from peer (for the log).
     Reply dispatch(std::string& body, const std::vector<std::string>& cookieHeaders,
-                   const std::string& peer) const;
+                   const std::string& peer) const override;
+    // Whether the operation of body answers from memory at once (small reads).
+    bool isQuick(const std::string& body) const override;
 
 private:
     Reply run(const Operations::Entry& entry, const Request& request) const;

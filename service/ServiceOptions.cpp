@@ -74,6 +74,17 @@ const std::map<std::string, Setter>& setters() {
          [](ServiceOptions& o, const std::string& v) {
              o.keepAliveSeconds = static_cast<int>(parseNumber("--keep-alive", v, 0, 3600));
          }},
+        {"--workflow-db", [](ServiceOptions& o, const std::string& v) { o.workflowDatabase = v; }},
+        {"--max-folders-per-user",
+         [](ServiceOptions& o, const std::string& v) {
+             o.maxFoldersPerUser =
+                 static_cast<int>(parseNumber("--max-folders-per-user", v, 1, 100000000));
+         }},
+        {"--max-items-per-folder",
+         [](ServiceOptions& o, const std::string& v) {
+             o.maxItemsPerFolder =
+                 static_cast<int>(parseNumber("--max-items-per-folder", v, 1, 100000000));
+         }},
         {"--log-level",
          [](ServiceOptions& o, const std::string& v) {
              if (v != "debug" && v != "info" && v != "warning" && v != "error") {
@@ -122,7 +133,9 @@ std::string ServiceOptions::usage(const std::string& program) {
            " [options]\n"
            "Answers the configuration protocol at "
            "/Sundrel/ConfigurationService/ConfigurationService.ashx\n"
-           "with an embedded directory store. Runs in the foreground; SIGINT or SIGTERM stops "
+           "with an embedded directory store, and the user-workflow protocol at\n"
+           "/Sundrel/UserWorkflowService/UserWorkFlow.ashx with an SQLite database. Runs in the "
+           "foreground; SIGINT or SIGTERM stops "
            "it.\n\n"
            "  --bind ADDRESS         address to listen on (default 127.0.0.1)\n"
            "  --port N               port to listen on, 0 for an ephemeral one (default 8771)\n"
@@ -153,6 +166,13 @@ std::string ServiceOptions::usage(const std::string& program) {
            "                         open connections from one peer address; further ones "
            "are\n"
            "                         closed at once (default 256)\n"
+           "  --workflow-db PATH     the user-workflow database (default: the store "
+           "directory's\n"
+           "                         path followed by .workflow.sqlite)\n"
+           "  --max-folders-per-user N\n"
+           "                         folders one user may own (default 1000)\n"
+           "  --max-items-per-folder N\n"
+           "                         items directly in one folder (default 50000)\n"
            "  --log-level LEVEL      debug, info, warning or error (default info); debug logs "
            "every request\n"
            "  --help                 this text\n"

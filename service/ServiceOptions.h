@@ -26,7 +26,11 @@ struct ServiceOptions {
     int requestTimeoutSeconds = 10;          // a whole request head; bodies get more by size
     int maxConnections = 10000;              // open connections, all peers
     int maxConnectionsPerPeer = 256;         // open connections from one peer address
-    std::string logLevel = "info";           // debug, info, warning or error
+    // The user-workflow database; empty: the store directory's path + ".workflow.sqlite".
+    std::string workflowDatabase;
+    int maxFoldersPerUser = 1000;   // folders one user may own; beyond: error code "42794"
+    int maxItemsPerFolder = 50000;  // items directly in one folder; beyond: error code "42795"
+    std::string logLevel = "info";  // debug, info, warning or error
     bool help = false;
 
     // Parses the arguments (without the program name); throws std::invalid_argument with a
