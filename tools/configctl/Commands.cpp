@@ -62,6 +62,8 @@ void Commands::run() {
         {"sop", &Commands::sopServices},
         {"topology", &Commands::topology},
         {"archive", &Commands::archive},
+        {"processes", &Commands::processes},
+        {"services", &Commands::services},
     };
     auto found = commands.find(m_options.command);
     if (found != commands.end()) {

@@ -12,7 +12,8 @@
 
 namespace Configuration {
 class HttpConfigurationClient;
-}
+class ProcessesAndServicesConfiguration;
+}  // namespace Configuration
 
 namespace Configctl {
 
@@ -49,6 +50,9 @@ private:
     void sopServices();
     void topology();
     void archive();
+    void processes();
+    void services();
+    void loadProcesses(Configuration::ProcessesAndServicesConfiguration& config);
 
     const ToolOptions& m_options;
     std::ostream& m_out;

@@ -17,7 +17,7 @@ using Configuration::MSMQConfiguration;
 using Configuration::ChainUtils::Chain;
 using Configuration::ChainUtils::Link;
 
-const char* const kCredentialKeys[] = {"TivoliServerAccessPassword"};
+const char* const kCredentialKeys[] = {"TivoliServerAccessPassword", "MasterDatabasePassword"};
 
 std::string text(const ACE_CString& s) {
     return std::string(s.c_str(), s.length());

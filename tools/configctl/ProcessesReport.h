@@ -1,0 +1,23 @@
+// ProcessesReport: a machine's processes table as an administrator reads it: one row per process
+// (name, module type, state, executable, how many services are enabled and disabled), its
+// services below it, then whether the table is valid; and the service-configurator text one
+// process loads. Stateless; thread-safe.
+#pragma once
+
+#include <ostream>
+#include <string>
+
+namespace Configuration {
+class ProcessesAndServicesConfiguration;
+}
+
+namespace Configctl {
+
+// Prints the processes and services of config to out.
+void printProcesses(const Configuration::ProcessesAndServicesConfiguration& config,
+                    std::ostream& out);
+
+// The name of a module type ("storage server", ...; "module N" for an unknown number).
+std::string moduleTypeName(unsigned int moduleType);
+
+}  // namespace Configctl
