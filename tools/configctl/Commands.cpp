@@ -64,6 +64,8 @@ void Commands::run() {
         {"archive", &Commands::archive},
         {"processes", &Commands::processes},
         {"services", &Commands::services},
+        {"users", &Commands::users},
+        {"folders", &Commands::folders},
     };
     auto found = commands.find(m_options.command);
     if (found != commands.end()) {

@@ -50,6 +50,9 @@ private:
     void sopServices();
     void topology();
     void archive();
+    void users();
+    void folders();
+    void printFolder(const ACE_CString& folderId, int depth);
     void processes();
     void services();
     void loadProcesses(Configuration::ProcessesAndServicesConfiguration& config);
