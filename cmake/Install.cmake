@@ -17,6 +17,17 @@ foreach(target Configuration Vesk QuorvexCommon)
   target_include_directories(${target} INTERFACE $<INSTALL_INTERFACE:${QUORVEX_INCLUDE_PREFIX}>)
 endforeach()
 
+# Outside /usr the installed libraries and programs find each other relative to themselves, so
+# that a prefix works without ldconfig; under /usr (the package) the linker's paths do.
+if(NOT CMAKE_INSTALL_PREFIX STREQUAL "/usr")
+  set_target_properties(Configuration Vesk QuorvexCommon ServerInterop PROPERTIES
+                        INSTALL_RPATH "$ORIGIN")
+  file(RELATIVE_PATH relative /${CMAKE_INSTALL_BINDIR} /${CMAKE_INSTALL_LIBDIR})
+  set_target_properties(configctl PROPERTIES INSTALL_RPATH "$ORIGIN/${relative}")
+  file(RELATIVE_PATH relative /${CMAKE_INSTALL_SBINDIR} /${CMAKE_INSTALL_LIBDIR})
+  set_target_properties(configuration-service PROPERTIES INSTALL_RPATH "$ORIGIN/${relative}")
+endif()
+
 install(TARGETS Configuration Vesk QuorvexCommon EXPORT ConfigurationTargets
         LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT runtime
                 NAMELINK_COMPONENT dev)
@@ -46,8 +57,14 @@ install(FILES ${PROJECT_BINARY_DIR}/ConfigurationConfig.cmake
               ${PROJECT_BINARY_DIR}/ConfigurationConfigVersion.cmake
         DESTINATION ${QUORVEX_CMAKE_DIR} COMPONENT dev)
 
-# The pkg-config file, relocatable through ${pcfiledir}.
-file(RELATIVE_PATH QUORVEX_PC_TO_PREFIX /${CMAKE_INSTALL_LIBDIR}/pkgconfig /)
+# The pkg-config file: absolute under /usr (the package), elsewhere relocatable through ${pcfiledir}.
+if(CMAKE_INSTALL_PREFIX STREQUAL "/usr")
+  set(QUORVEX_PC_PREFIX /usr)
+else()
+  file(RELATIVE_PATH relative /${CMAKE_INSTALL_LIBDIR}/pkgconfig /)
+  string(REGEX REPLACE "/$" "" relative "${relative}")
+  set(QUORVEX_PC_PREFIX "\${pcfiledir}/${relative}")
+endif()
 configure_file(${PROJECT_SOURCE_DIR}/packaging/configuration.pc.in
                ${PROJECT_BINARY_DIR}/configuration.pc @ONLY)
 install(FILES ${PROJECT_BINARY_DIR}/configuration.pc
