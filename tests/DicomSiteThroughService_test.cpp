@@ -206,8 +206,8 @@ TEST_F(DicomSite, GlobalExportSettingsAndTheirAdapterShareOneDocument) {
     EXPECT_EQ(3u, global.getAnonymizationParams().size());
 }
 
-// Writable documents store themselves through the repository.
-TEST_F(DicomSite, DestinationsStoreThemselvesThroughTheRepository) {
+// Writable documents store themselves through the repository; the read-only rules refuse.
+TEST_F(DicomSite, DocumentsStoreThroughTheRepositoryAndTheRulesRefuse) {
     storeSite();
     KelExportRemoteConfigurations remotes;
     ASSERT_EQ(0, repository->GetLatest(remotes));
@@ -219,6 +219,13 @@ TEST_F(DicomSite, DestinationsStoreThemselvesThroughTheRepository) {
     ASSERT_EQ(0, repository->GetLatest(again, true));
     EXPECT_EQ(2u, again.getRemoteScps().size());
     EXPECT_EQ(remotes, again);
+
+    AutoExportConfiguration rules;
+    ASSERT_EQ(0, repository->GetLatest(rules));
+    EXPECT_EQ(-1, repository->Store(rules));
+    AutoExportConfiguration unchanged;
+    ASSERT_EQ(0, repository->GetLatest(unchanged, true));
+    EXPECT_EQ(rules, unchanged);
 }
 
 }  // namespace
