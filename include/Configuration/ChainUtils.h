@@ -27,7 +27,7 @@ namespace Configuration {
 namespace ChainUtils {
 
 // What a link definition turned out to be when it was resolved.
-enum ChainLinkDefinitionType {
+enum ChainLinkDefinitionType : int {
     Unresolved = 0,    // not resolved yet (the default of a link read without a type)
     ActiveStack = 1,   // a stack resolved from the persistent or persistent-mirror keyword
     Host = 2,          // reserved: never produced by the resolution

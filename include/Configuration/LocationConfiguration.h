@@ -26,7 +26,7 @@ public:
     using Profiles = std::list<LocationProfile>;
 
     // Where a host is, seen from a location (MapHostToLocationProfile).
-    enum HostLocation {
+    enum HostLocation : int {
         SameNetwork = 0,       // on the location's own network
         OtherNetwork = 1,      // across the boundary between the site's LAN and a WAN
         OtherWanLocation = 2,  // at another location on the WAN

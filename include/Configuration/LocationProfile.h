@@ -28,15 +28,15 @@ class CONFIGURATION_API LocationProfile : public virtual Vesk::Serializable {
 public:
     static constexpr const char WELL_KNOWN_NAME[] = "LocationProfile";
 
-    // What kind of location this is.
-    enum LocationType {
+    // What kind of location this is (any number a document holds is kept).
+    enum LocationType : int {
         MainLocation = 0,     // the main site
         RemoteLocation = 1,   // a remote site on the site's own network
         RemoteWanAccess = 2,  // a remote site reached over a WAN
         RemoteWanCached = 3,  // a remote site reached over a WAN, with its own cache
     };
-    // Which network the location is on.
-    enum NetworkAffiliation {
+    // Which network the location is on (any number a document holds is kept).
+    enum NetworkAffiliation : int {
         Vlan = 0,  // the site's own (virtual) LAN
         Wan = 1,   // a wide-area network
     };
