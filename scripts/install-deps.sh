@@ -12,6 +12,7 @@ PACKAGES=(
   libdcmtk-dev libsqlite3-dev
   curl wrk etcd-server python3
   graphviz
+  help2man lintian
 )
 
 missing=()
