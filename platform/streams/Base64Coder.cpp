@@ -10,6 +10,7 @@
 #include <iterator>
 #include <stdexcept>
 #include <string>
+#include <utility>
 
 namespace {
 
@@ -107,6 +108,48 @@ std::size_t paddingOf(const char* text, std::size_t len) {
     return text[len - 2] == '=' ? 2 : 1;
 }
 
+// The common case in one pass: a text without blanks and without faults, decoded straight into
+// its buffer. False, with bytes and outLen untouched, for anything else (blanks, a bad character
+// or length, an empty text), which the careful decoder then handles and reports.
+bool decodeCompact(const char* text, std::size_t len, Quorvex::ByteArray& bytes,
+                   std::size_t& outLen) {
+    if (len == 0 || len % 4 != 0) {
+        return false;
+    }
+    const auto* u = reinterpret_cast<const unsigned char*>(text);
+    const std::size_t pad = paddingOf(text, len);
+    const std::size_t full = pad == 0 ? len : len - 4;
+    const std::size_t size = len / 4 * 3 - pad;
+    Quorvex::ByteArray out(new unsigned char[size]);
+    unsigned char* o = out.get();
+    for (std::size_t i = 0; i < full; i += 4, o += 3) {
+        const std::uint8_t a = kDecode[u[i]], b = kDecode[u[i + 1]], c = kDecode[u[i + 2]],
+                           d = kDecode[u[i + 3]];
+        if (((a | b | c | d) & 0x80) != 0) {
+            return false;
+        }
+        const std::uint32_t v = (std::uint32_t{a} << 18) | (b << 12) | (c << 6) | d;
+        o[0] = static_cast<unsigned char>(v >> 16);
+        o[1] = static_cast<unsigned char>(v >> 8);
+        o[2] = static_cast<unsigned char>(v);
+    }
+    if (pad > 0) {
+        const std::uint8_t a = kDecode[u[full]], b = kDecode[u[full + 1]],
+                           c = pad == 1 ? kDecode[u[full + 2]] : 0;
+        const std::uint32_t v = (std::uint32_t{a} << 18) | (b << 12) | (c << 6);
+        if (((a | b | c) & 0x80) != 0 || (v & (pad == 1 ? 0xFFu : 0xFFFFu)) != 0) {
+            return false;
+        }
+        o[0] = static_cast<unsigned char>(v >> 16);
+        if (pad == 1) {
+            o[1] = static_cast<unsigned char>(v >> 8);
+        }
+    }
+    bytes = std::move(out);
+    outLen = size;
+    return true;
+}
+
 }  // namespace
 
 ACE_CString Base64Coder::Encode(const unsigned char* data, std::size_t len) {
@@ -134,6 +177,10 @@ ACE_CString Base64Coder::Encode(const unsigned char* data, std::size_t len) {
 
 Quorvex::ByteArray Base64Coder::Decode(const char* given, std::size_t givenLength,
                                        std::size_t& outLen) {
+    Quorvex::ByteArray compact;
+    if (decodeCompact(given, givenLength, compact, outLen)) {
+        return compact;
+    }
     const Significant in(given, givenLength);
     const char* text = in.text();
     const std::size_t len = in.length();

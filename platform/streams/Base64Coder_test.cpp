@@ -50,6 +50,28 @@ TEST(Base64Coder, RandomRoundTrips) {
     }
 }
 
+// A large document decodes the same in one piece (the one-pass road) and wrapped in 76-character
+// lines (the blank-skipping road), and a bad character near its end is still found.
+TEST(Base64Coder, LargeTextsDecodeAlikeWrappedOrNot) {
+    std::mt19937 gen(7);
+    for (const std::size_t len : {std::size_t{65536}, std::size_t{65537}, std::size_t{65538}}) {
+        std::string bytes(len, '\0');
+        for (auto& c : bytes) {
+            c = static_cast<char>(gen());
+        }
+        const std::string text = encode(bytes);
+        std::string wrapped;
+        for (std::size_t i = 0; i < text.size(); i += 76) {
+            wrapped += text.substr(i, 76) + "\r\n";
+        }
+        EXPECT_EQ(bytes, decode(text));
+        EXPECT_EQ(bytes, decode(wrapped));
+        std::string broken = text;
+        broken[text.size() - 5] = '*';
+        EXPECT_THROW(decode(broken), std::invalid_argument);
+    }
+}
+
 // Wrapped or spaced-out text, as some services and proxies send it: the blanks and line breaks go,
 // wherever they stand, even inside the padding.
 TEST(Base64Coder, SkipsBlanksAndLineBreaks) {
