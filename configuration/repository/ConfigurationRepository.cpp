@@ -7,6 +7,7 @@
 #include <ace/Reactor.h>
 
 #include <atomic>
+#include <limits>
 #include <stdexcept>
 
 #include "Common/NamedEvent.h"
@@ -25,6 +26,22 @@ namespace {
 const char kChangeEventName[] = "Global\\QuorvexSlaveConfigurationChanged";
 
 std::atomic<ConfigurationRepository*> s_instance{nullptr};
+
+std::atomic<std::uint64_t> s_nextRepositoryId{1};
+
+// One thread's view of a repository's cache: the entries it has read, all taken while the
+// cache's generation was the one recorded. A change of the cache makes the view stale; the
+// thread drops it on its next read, so it keeps stale entries alive at most until then.
+struct ThreadView {
+    std::uint64_t repository = 0;
+    std::uint64_t generation = 0;
+    std::map<ACE_CString, std::shared_ptr<const CachedDocument>> entries;
+};
+
+ThreadView& threadView() {
+    thread_local ThreadView view;
+    return view;
+}
 
 std::shared_ptr<ServiceConnector> connectorFromEnvironment() {
     ServiceLocation location = ServiceLocation::fromEnvironment();
@@ -68,14 +85,14 @@ ConfigurationRepository* ConfigurationRepository::instance() {
 }
 
 ConfigurationRepository::ConfigurationRepository(std::shared_ptr<ServiceConnector> connector)
-    : m_connector(std::move(connector)) {
+    : m_id(s_nextRepositoryId.fetch_add(1)), m_connector(std::move(connector)) {
     const ACE_CString localHost = Quorvex::GetHostName(false);
     if (localHost.length() == 0) {
         throw std::runtime_error("ConfigurationRepository::Unable to retrieve hostname");
     }
     m_virtualHostName = m_connector->connect(localHost)->hostName();
     m_masterHostName = m_virtualHostName;
-    m_nextCheck = BDateTime::Now();
+    setNextCheck(BDateTime::Now());
     openChangeEvent();
 }
 
@@ -120,8 +137,12 @@ int ConfigurationRepository::GetLatest(ConfigDoc& document, bool force) {
 }
 
 // The cache lock is held only to look an entry up and to swap one in: the requests to the store
-// run outside it, so a slow or dead service never stalls other threads' cached reads.
+// run outside it, so a slow or dead service never stalls other threads' cached reads. A read that
+// this thread's view can serve takes no lock at all, so cached readers never wait on each other.
 void ConfigurationRepository::GetLatest_i(ConfigDoc& document, bool force) {
+    if (!force && readFromView(document)) {
+        return;
+    }
     ACE_CString host;
     std::shared_ptr<const CachedDocument> entry;
     bool check = false;
@@ -134,7 +155,7 @@ void ConfigurationRepository::GetLatest_i(ConfigDoc& document, bool force) {
             const BDateTime now = BDateTime::Now();
             check = force || now > m_nextCheck;
             if (check) {
-                m_nextCheck = now + BTime(0, 5, 0);
+                setNextCheck(now + BTime(0, 5, 0));
             }
         }
     }
@@ -151,6 +172,50 @@ void ConfigurationRepository::GetLatest_i(ConfigDoc& document, bool force) {
         copy = entry->copyOf(document);
     }
     document.assignFrom(*copy);
+    refreshView(document.path());
+}
+
+bool ConfigurationRepository::readFromView(ConfigDoc& document) const {
+    const ThreadView& view = threadView();
+    if (view.repository != m_id ||
+        view.generation != m_readState.generation.load(std::memory_order_acquire) ||
+        BDateTime::Now().millisecondsSinceEpoch() >
+            m_readState.nextCheckMs.load(std::memory_order_relaxed)) {
+        return false;
+    }
+    const auto found = view.entries.find(document.path());
+    if (found == view.entries.end()) {
+        return false;
+    }
+    const ConfigDoc* copy = found->second->copyOf(document);
+    if (copy == nullptr) {
+        return false;
+    }
+    document.assignFrom(*copy);
+    return true;
+}
+
+void ConfigurationRepository::refreshView(const ACE_CString& path) const {
+    ThreadView& view = threadView();
+    ACE_Guard<ACE_Thread_Mutex> guard(m_cacheLock);
+    const std::uint64_t generation = m_readState.generation.load(std::memory_order_relaxed);
+    if (view.repository != m_id || view.generation != generation) {
+        view.entries.clear();
+        view.repository = m_id;
+        view.generation = generation;
+    }
+    const auto found = m_cache.find(path);
+    if (found != m_cache.end() && found->second) {
+        view.entries[path] = found->second;
+    }
+}
+
+// Called with the cache lock held. An invalid time is never passed, as before.
+void ConfigurationRepository::setNextCheck(const BDateTime& when) {
+    m_nextCheck = when;
+    m_readState.nextCheckMs.store(
+        when.isValid() ? when.millisecondsSinceEpoch() : std::numeric_limits<std::int64_t>::max(),
+        std::memory_order_relaxed);
 }
 
 // The latest state of document's path as an entry: cached unchanged when the store's timestamp
@@ -187,8 +252,9 @@ void ConfigurationRepository::keep(const ACE_CString& path,
                                    const std::shared_ptr<const CachedDocument>& entry) {
     ACE_Guard<ACE_Thread_Mutex> guard(m_cacheLock);
     std::shared_ptr<const CachedDocument>& slot = m_cache[path];
-    if (slot == expected) {
+    if (slot == expected && slot != entry) {
         slot = entry;
+        m_readState.generation.fetch_add(1, std::memory_order_release);
     }
 }
 
@@ -211,6 +277,7 @@ int ConfigurationRepository::Store(ConfigDoc& document) {
         std::shared_ptr<const Vesk::Element>(tree.release()), document);
     ACE_Guard<ACE_Thread_Mutex> guard(m_cacheLock);
     m_cache[document.path()] = std::move(entry);
+    m_readState.generation.fetch_add(1, std::memory_order_release);
     return 0;
 }
 

@@ -4,6 +4,7 @@
 
 #include <chrono>
 #include <cstdlib>
+#include <functional>
 #include <future>
 #include <set>
 #include <thread>
@@ -116,6 +117,32 @@ TEST_F(RepositoryConcurrency, CachedReadsGoOnWhileAServiceHangs) {
     EXPECT_TRUE(served);
     EXPECT_TRUE(cached.get());
     EXPECT_EQ(hung.get(), 0);
+}
+
+// Cached reads are served from a view each thread keeps: guards against a view outliving a change
+// that another thread made, by storing the document or through the change event.
+TEST_F(RepositoryConcurrency, AThreadsCachedReadsSeeChangesMadeOnOtherThreads) {
+    const std::function<void()> changes[] = {
+        [&] {
+            TestDocument written("One");
+            written.name = "Uno";
+            written.size = 3;
+            ASSERT_EQ(repository->Store(written), 0);
+        },
+        [&] {
+            local.put("master", "BrimmetServer\\One", stored("Eins"), "2011-01-01T00:00:00.000");
+            repository->handle_signal(0);
+        }};
+    const char* const expected[] = {"Uno", "Eins"};
+    for (int i = 0; i < 2; ++i) {
+        TestDocument before("One");
+        ASSERT_EQ(repository->GetLatest(before), 0);
+        std::thread(changes[i]).join();
+        TestDocument after("One");
+        ASSERT_EQ(repository->GetLatest(after), 0);
+        EXPECT_EQ(after.name, expected[i]) << i;
+        EXPECT_EQ(after.size, after.name.length()) << i;
+    }
 }
 
 // Guards against instance() locking a fresh mutex on every call: threads racing on first use

@@ -24,7 +24,9 @@
 #include <ace/SString.h>
 #include <ace/Thread_Mutex.h>
 
+#include <atomic>
 #include <cstddef>
+#include <cstdint>
 #include <map>
 #include <memory>
 #include <utility>
@@ -120,6 +122,13 @@ public:
 
 private:
     void GetLatest_i(ConfigDoc& document, bool force);
+    // Serves document from this thread's view of the cache without any lock; false when the view
+    // is stale, lacks the document or its class, or the check time has passed.
+    bool readFromView(ConfigDoc& document) const;
+    // Puts the cache's current entry for path into this thread's view.
+    void refreshView(const ACE_CString& path) const;
+    // Sets the shared check time (cache lock held).
+    void setNextCheck(const BDateTime& when);
     std::shared_ptr<const CachedDocument> fetch(
         const ACE_CString& host, const ConfigDoc& document,
         const std::shared_ptr<const CachedDocument>& cached);
@@ -138,6 +147,15 @@ private:
     ACE_CString m_virtualHostName;
     ACE_CString m_masterHostName;
     BDateTime m_nextCheck;
+    // What a lock-free cached read looks at, on a cache line of its own that only changes of the
+    // cache write: the cache's generation (bumped under the cache lock at every change) and
+    // m_nextCheck in milliseconds. Each thread keeps its own view of the entries it has read,
+    // valid while the generation is the one it was taken at.
+    struct alignas(64) ReadState {
+        std::atomic<std::uint64_t> generation{0};
+        std::atomic<std::int64_t> nextCheckMs{0};
+    } m_readState;
+    const std::uint64_t m_id;  // tells this repository's thread views from another's
     std::unique_ptr<Common::NamedEvent> m_changeEvent;
     std::shared_ptr<ServiceConnector> m_connector;
     bool m_registered = false;
