@@ -16,8 +16,9 @@
 // cached as its element tree beside a typed copy per class, so classes that name the same
 // document are all served from the cache. Every public call is thread-safe; the cache lock is
 // never held across a request to a service, so a slow service delays only the calls that need
-// it. Remote failures never throw: they give -1 and a log line, and the caller's document keeps
-// what it had.
+// it, and a cached read takes no lock at all (each thread keeps a view of the entries it has
+// read, dropped at the next change of the cache). Remote failures never throw: they give -1 and a
+// log line, and the caller's document keeps what it had.
 #pragma once
 
 #include <ace/Event_Handler.h>
