@@ -12,6 +12,7 @@
 #include "Configuration/StoredForm.h"
 #include "DicomSite.h"
 #include "DicomSiteReport.h"
+#include "JsonText.h"
 #include "Quorvex/BDateTime.h"
 #include "SopServiceReport.h"
 #include "StorageTopologyReport.h"
@@ -111,6 +112,16 @@ void Commands::hosts() {
     } else {
         client().listHosts(hosts);
     }
+    if (m_options.json) {
+        const char* separator = "";
+        m_out << "[";
+        for (const ACE_CString& name : hosts) {
+            m_out << separator << jsonString(name.c_str());
+            separator = ",";
+        }
+        m_out << "]\n";
+        return;
+    }
     for (const ACE_CString& name : hosts) {
         m_out << name.c_str() << "\n";
     }
@@ -120,6 +131,18 @@ void Commands::items() {
     expectArguments(0, 0, "items [--host NAME|*]");
     std::vector<Configuration::_HttpConfigurationItemInfo> items;
     client().listItems(host(), items);
+    if (m_options.json) {
+        const char* separator = "";
+        m_out << "[";
+        for (const auto& item : items) {
+            m_out << separator << "{\"host\":" << jsonString(item.host.c_str())
+                  << ",\"name\":" << jsonString(item.configurationName.c_str())
+                  << ",\"lastModified\":" << jsonString(item.lastModifiedTime.c_str()) << "}";
+            separator = ",";
+        }
+        m_out << "]\n";
+        return;
+    }
     for (const auto& item : items) {
         m_out << item.lastModifiedTime.c_str() << "  " << item.host.c_str() << "  "
               << item.configurationName.c_str() << "\n";

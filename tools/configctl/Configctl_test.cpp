@@ -16,9 +16,9 @@ struct ToolRun {
     std::string out;
 };
 
-// Runs configctl with arguments (shell-quoted by the caller); stderr joins stdout.
-ToolRun configctl(const std::string& arguments) {
-    const std::string command = std::string(CONFIGCTL_BINARY) + " " + arguments + " 2>&1";
+// Runs a shell command line; stderr joins stdout.
+ToolRun shell(const std::string& commandLine) {
+    const std::string command = commandLine + " 2>&1";
     FILE* pipe = ::popen(command.c_str(), "r");
     ToolRun run{-1, ""};
     char buffer[4096];
@@ -28,6 +28,11 @@ ToolRun configctl(const std::string& arguments) {
     const int status = ::pclose(pipe);
     run.status = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
     return run;
+}
+
+// Runs configctl with arguments (shell-quoted by the caller); stderr joins stdout.
+ToolRun configctl(const std::string& arguments) {
+    return shell(std::string(CONFIGCTL_BINARY) + " " + arguments);
 }
 
 TEST(Configctl, PutThenGetPrintsTheDocumentIndented) {
@@ -45,15 +50,58 @@ TEST(Configctl, PutThenGetPrintsTheDocumentIndented) {
     EXPECT_NE(items.out.find("TestHost  Brimmet\\DicomScp"), std::string::npos) << items.out;
 }
 
-TEST(Configctl, FailuresExitNonZeroWithOneLine) {
+// The list commands in JSON for scripts: one array, each document's host, name and time.
+TEST(Configctl, ListCommandsPrintJson) {
     ServiceTesting::InProcessService service;
-    const ToolRun missing = configctl("--server " + service.address() + " get Absent");
-    EXPECT_EQ(missing.status, 1);
-    EXPECT_EQ(missing.out.rfind("configctl: ", 0), 0u);
-    EXPECT_EQ(missing.out.find('\n'), missing.out.size() - 1) << missing.out;
-    EXPECT_EQ(configctl("--server " + service.address() + " put Doc /nonexistent.xml").status, 1);
-    EXPECT_EQ(configctl("--frobnicate hosts").status, 1);
-    EXPECT_EQ(configctl("--server 127.0.0.1:1 hosts").status, 1);
+    const std::string server = "--server " + service.address();
+    const std::string file = service.storeDirectory() + "-doc.xml";
+    std::ofstream(file) << "<e k=\"StorageSCP\"><l><e k=\"Port\"><s>104</s></e></l></e>";
+    ASSERT_EQ(configctl(server + " put 'Brimmet\\DicomScp' " + file).status, 0);
+    const ToolRun items = configctl(server + " --output json items --host '*'");
+    EXPECT_EQ(items.status, 0) << items.out;
+    EXPECT_EQ(items.out.rfind("[{\"host\":\"TestHost\",\"name\":\"Brimmet\\\\DicomScp\",", 0), 0u)
+        << items.out;
+    EXPECT_EQ(items.out.substr(items.out.size() - 4), "\"}]\n") << items.out;
+    const ToolRun hosts = configctl(server + " --output=json hosts");
+    EXPECT_EQ(hosts.status, 0) << hosts.out;
+    EXPECT_EQ(hosts.out.front(), '[') << hosts.out;
+    EXPECT_EQ(configctl(server + " --output yaml hosts").status, 6);
+}
+
+// Each kind of failure has its own exit status (documented in --help) and one line on stderr.
+TEST(Configctl, FailuresExitWithTheirOwnStatusAndOneLine) {
+    ServiceTesting::InProcessService service;
+    const std::string server = "--server " + service.address();
+    const std::string malformed = service.storeDirectory() + "-malformed.xml";
+    std::ofstream(malformed) << "<Probe/>";
+    const std::string noTicket = "QUORVEX_SERVICE_TICKET_FILE=/nonexistent/ticket";
+    const struct {
+        std::string environment;
+        std::string arguments;
+        int status;
+    } kFailures[] = {
+        {"", server + " get Absent", 3},
+        {noTicket, server + " items", 4},
+        {"", "--server 127.0.0.1:1 hosts", 5},
+        {"", "--frobnicate hosts", 6},
+        {"", server + " get", 6},
+        {"", server + " put Doc /nonexistent.xml", 6},
+        {"", server + " put Doc " + malformed, 6},
+    };
+    for (const auto& failure : kFailures) {
+        const ToolRun run =
+            shell(failure.environment + " " + CONFIGCTL_BINARY + " " + failure.arguments);
+        EXPECT_EQ(run.status, failure.status) << failure.arguments << ": " << run.out;
+        EXPECT_EQ(run.out.rfind("configctl: ", 0), 0u) << run.out;
+        EXPECT_EQ(run.out.find('\n'), run.out.size() - 1) << run.out;
+    }
+}
+
+TEST(Configctl, VersionPrintsTheProjectVersion) {
+    const ToolRun run = configctl("--version");
+    EXPECT_EQ(run.status, 0);
+    EXPECT_EQ(run.out.rfind("configctl ", 0), 0u) << run.out;
+    EXPECT_EQ(run.out.find('\n'), run.out.size() - 1) << run.out;
 }
 
 // The SOP service sample, stored as is: each service with the syntaxes it accepts, by UID and name.
@@ -90,7 +138,7 @@ TEST(Configctl, SopPrintsEachServiceWithTheSyntaxesItAccepts) {
                                                              << sop.out;
     }
     const ToolRun missing = configctl(server + " sop Absent");
-    EXPECT_EQ(missing.status, 1);
+    EXPECT_EQ(missing.status, 3);  // not found
 }
 
 TEST(Configctl, OptionsAndHelp) {

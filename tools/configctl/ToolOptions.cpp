@@ -46,6 +46,8 @@ ToolOptions ToolOptions::parse(const std::vector<std::string>& args) {
         const std::string& arg = args[i];
         if (arg == "--help" || arg == "-h") {
             options.help = true;
+        } else if (arg == "--version") {
+            options.version = true;
         } else if (arg == "--https") {
             options.https = true;
         } else if (arg == "--dot") {
@@ -56,6 +58,11 @@ ToolOptions ToolOptions::parse(const std::vector<std::string>& args) {
             options.server = value;
         } else if (takeValue(args, i, "--host", value)) {
             options.host = value;
+        } else if (takeValue(args, i, "--output", value)) {
+            if (value != "json" && value != "text") {
+                throw std::invalid_argument("--output is json or text, not \"" + value + "\"");
+            }
+            options.json = value == "json";
         } else if (takeValue(args, i, "--module-type", value)) {
             options.moduleType = parseModuleType(value);
         } else if (arg.compare(0, 2, "--") == 0) {
@@ -66,7 +73,7 @@ ToolOptions ToolOptions::parse(const std::vector<std::string>& args) {
             options.arguments.push_back(arg);
         }
     }
-    if (options.command.empty() && !options.help) {
+    if (options.command.empty() && !options.help && !options.version) {
         throw std::invalid_argument("no command given (see --help)");
     }
     return options;
@@ -119,9 +126,21 @@ std::string ToolOptions::usage() {
            "  --module-type N     hosts: only hosts that registered a module of type N\n"
            "  --dot               topology: print a Graphviz graph\n"
            "  --https             talk TLS\n"
-           "  --help              this text\n\n"
-           "The machine's service ticket is sent as cookie OrvelWebApplication. On failure the "
-           "exit status is 1 and one line on stderr says why.\n";
+           "  --help              this text\n"
+           "  --output FORMAT     text (default) or json: hosts and items print a JSON array\n"
+           "  --version           print configctl's version\n\n"
+           "The machine's service ticket ($QUORVEX_SERVICE_TICKET_FILE, default\n"
+           "/etc/quorvex/service-ticket, as for the library) is sent as cookie "
+           "OrvelWebApplication.\n"
+           "On failure one line on stderr says why.\n\n"
+           "Exit status:\n"
+           "  0  success\n"
+           "  1  any other failure\n"
+           "  2  check: the site has mistakes\n"
+           "  3  not found: the document or path does not exist\n"
+           "  4  access denied: the service refused the ticket, or no usable ticket\n"
+           "  5  unreachable: no answer from the service\n"
+           "  6  bad input: bad options or arguments, unreadable or malformed input file\n";
 }
 
 }  // namespace Configctl

@@ -18,6 +18,8 @@ struct ToolOptions {
     int moduleType = -1;     // hosts: only hosts running this module type (-1: all)
     bool dot = false;        // topology: a Graphviz graph instead of text
     bool help = false;
+    bool version = false;  // --version: print the version and stop
+    bool json = false;     // --output json: list commands print JSON
     std::string command;
     std::vector<std::string> arguments;
 

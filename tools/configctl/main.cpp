@@ -5,7 +5,7 @@
 #include <string>
 
 #include "Commands.h"
-#include "SiteCheck.h"
+#include "ExitStatus.h"
 #include "ToolOptions.h"
 
 int main(int argc, char** argv) {
@@ -19,12 +19,12 @@ int main(int argc, char** argv) {
             std::cout << Configctl::ToolOptions::usage();
             return 0;
         }
+        if (options.version) {
+            std::cout << "configctl " << CONFIGCTL_VERSION << "\n";
+            return 0;
+        }
         Configctl::Commands(options, std::cout).run();
         return 0;
-    } catch (const Configctl::CheckFailed& e) {
-        std::cout.flush();
-        std::cerr << "configctl: " << e.what() << "\n";
-        return 2;
     } catch (const std::exception& e) {
         std::string message = e.what();
         while (!message.empty() && (message.back() == '\n' || message.back() == '\r')) {
@@ -35,7 +35,8 @@ int main(int argc, char** argv) {
                 c = ' ';
             }
         }
+        std::cout.flush();
         std::cerr << "configctl: " << message << "\n";
-        return 1;
+        return Configctl::exitStatusFor(e);
     }
 }
