@@ -1,11 +1,11 @@
 // configctl's machine commands: processes (a machine's processes and services as a table) and
 // services (the service-configurator text one process of the machine loads).
 #include <ostream>
-#include <stdexcept>
 #include <string>
 
 #include "Commands.h"
 #include "Configuration/HttpConfigurationClient.h"
+#include "Configuration/HttpConfigurationPathNotFoundException.h"
 #include "Configuration/ProcessesAndServicesConfiguration.h"
 #include "Configuration/StoredForm.h"
 #include "ProcessesReport.h"
@@ -18,7 +18,8 @@ void Commands::loadProcesses(Configuration::ProcessesAndServicesConfiguration& c
     bool found = false;
     client().checkForExistence(machine, config.path(), found);
     if (!found) {
-        throw std::runtime_error(std::string("no processes table for host ") + machine.c_str());
+        throw Configuration::HttpConfigurationPathNotFoundException(
+            ACE_CString("the processes table of host ") + machine + " not found");
     }
     Quorvex::ByteArray bytes;
     std::size_t length = 0;
@@ -47,8 +48,8 @@ void Commands::services() {
         known = known || (process.getProcessName() == name && process.isSelected());
     }
     if (!known) {
-        throw std::runtime_error("no selected process " + m_options.arguments[0] + " on host " +
-                                 host().c_str());
+        throw Configuration::HttpConfigurationPathNotFoundException(
+            ACE_CString("selected process ") + name + " of host " + host() + " not found");
     }
     const ACE_CString directives = config.getServiceDirectives(name);
     m_out << directives.c_str();
