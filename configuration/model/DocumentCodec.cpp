@@ -12,6 +12,11 @@ namespace DocumentCodec {
 Quorvex::auto_ptr<Vesk::Element> writeItem(const ACE_CString& name, ConfigDoc& document,
                                            const StoreFunction& store) {
     Quorvex::auto_ptr<Vesk::Element> tree = document.writeVesk();
+    if (!tree) {  // a class that writes nothing (its document is kept by other means)
+        throw std::runtime_error(std::string("ConfigurationRepository::WriteItem: nothing to store "
+                                             "for ") +
+                                 document.path().c_str());
+    }
     const std::string bytes = StoredForm::encode(*tree);
     document.timestamp(BDateTime::Now());
     const int result =

@@ -1,12 +1,12 @@
 // Turns a configuration document into its stored bytes and back, around the caller's store and
 // retrieve operations (the repository's WriteItem and ReadItem).
 //
-// writeItem: writeVesk, encode, set the document's timestamp to now, hand name, path, bytes and
-// timestamp to store; returns the tree when store reports 0, else null. The new timestamp stays
-// on the document even when the store fails: callers do not roll it back.
-// readItem: retrieve bytes and timestamp (non-zero result: -1), decode, readVesk; returns 0 and
-// sets the stored timestamp when every key was read (and hands the decoded tree to treeOut when
-// given), and throws std::runtime_error
+// writeItem: writeVesk (a class that writes no tree: std::runtime_error), encode, set the
+// document's timestamp to now, hand name, path, bytes and timestamp to store; returns the tree when
+// store reports 0, else null. The new timestamp stays on the document even when the store fails:
+// callers do not roll it back. readItem: retrieve bytes and timestamp (non-zero result: -1),
+// decode, readVesk; returns 0 and sets the stored timestamp when every key was read (and hands the
+// decoded tree to treeOut when given), and throws std::runtime_error
 // "ConfigurationRepository::ReadItem: Error parsing configuration: <path>\n" when one was missing.
 // Decode failures pass on as their own exceptions. Stateless; thread-safe for distinct documents.
 #pragma once

@@ -197,6 +197,25 @@ TEST_F(RepositoryTest, StoringAReadOnlyDocumentIsMinusOneAndALogLine) {
     EXPECT_EQ(master.stores, 0);
 }
 
+// A document class whose writeVesk gives no tree, as the site's queue settings do.
+class WritesNothing : public TypedConfigDoc<WritesNothing> {
+public:
+    WritesNothing() : TypedConfigDoc(ConfigDoc::getConfigurationRegistryPath() + "Empty", false) {}
+    bool readVesk(const Vesk::Element&) override { return true; }
+    Quorvex::auto_ptr<Vesk::Element> writeVesk() const override {
+        return Quorvex::auto_ptr<Vesk::Element>();
+    }
+};
+
+// Guards against Store dereferencing the missing tree of a class that writes nothing.
+TEST_F(RepositoryTest, StoringADocumentThatWritesNothingIsMinusOne) {
+    Quorvex::Testing::LogCapture log;
+    WritesNothing document;
+    EXPECT_EQ(repository->Store(document), -1);
+    EXPECT_TRUE(log.containsFragment("nothing to store for BrimmetServer\\Empty"));
+    EXPECT_EQ(master.stores, 0);
+}
+
 TEST_F(RepositoryTest, DocumentMissingAKeyIsAnErrorAndNotCached) {
     Vesk::Element partial("TestDoc", -1);
     partial.addMultiElement().addElement("Name", {}, -1).addSingle().assign("only");
