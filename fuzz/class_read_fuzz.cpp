@@ -9,6 +9,7 @@
 #include <exception>
 
 #include "Configuration/AnonParam.h"
+#include "Configuration/ApplicationLocationConfiguration.h"
 #include "Configuration/AutoExportConfiguration.h"
 #include "Configuration/DMWLTarget.h"
 #include "Configuration/DicomClientConfiguration.h"
@@ -22,11 +23,14 @@
 #include "Configuration/LocationConfiguration.h"
 #include "Configuration/LocationMigrationChain.h"
 #include "Configuration/MSMQConfiguration.h"
+#include "Configuration/OrvelSystemCommonConfiguration.h"
 #include "Configuration/OrvelSystemConfiguration.h"
+#include "Configuration/ProcessesAndServicesConfiguration.h"
 #include "Configuration/QrscpConfiguration.h"
 #include "Configuration/RulesConfiguration.h"
 #include "Configuration/SOPServiceConfiguration.h"
 #include "Configuration/SSCPConfiguration.h"
+#include "Configuration/ServerInfo.h"
 #include "Configuration/StorageCommitConfiguration.h"
 #include "Configuration/StrategyConfiguration.h"
 #include "ConventionSample.h"
@@ -125,6 +129,15 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     readWriteRead<Configuration::KelArchiveConfiguration>(tree);
     readWriteRead<Configuration::LocationProfile>(tree);
     readWriteRead<Configuration::LocationConfiguration>(tree);
+    readWriteRead<Configuration::ProcessesAndServicesConfiguration::Service>(tree);
+    readWriteRead<Configuration::ProcessesAndServicesConfiguration::Process>(tree);
+    readWriteRead<Configuration::ProcessesAndServicesConfiguration>(tree);
+    readWriteRead<Configuration::OrvelSystemCommonConfiguration>(tree);
+    readWriteRead<Configuration::SolutionDefinition>(tree);
+    readWriteRead<Configuration::ProductDefinitions>(tree);
+    readWriteRead<Configuration::ApplicationDefinitions>(tree);
+    readWriteRead<Configuration::ApplicationLocationConfiguration>(tree);
+    readWriteRead<Configuration::ServerInfo>(tree);
     readWriteRead<Configuration::Testing::Convention>(tree);
     return 0;
 }
