@@ -7,33 +7,14 @@
 
 #include "InProcessService.h"
 #include "ToolOptions.h"
+#include "ToolRun.h"
 
 namespace Configctl {
 namespace {
 
-struct ToolRun {
-    int status;
-    std::string out;
-};
-
-// Runs a shell command line; stderr joins stdout.
-ToolRun shell(const std::string& commandLine) {
-    const std::string command = commandLine + " 2>&1";
-    FILE* pipe = ::popen(command.c_str(), "r");
-    ToolRun run{-1, ""};
-    char buffer[4096];
-    for (std::size_t got; (got = std::fread(buffer, 1, sizeof buffer, pipe)) > 0;) {
-        run.out.append(buffer, got);
-    }
-    const int status = ::pclose(pipe);
-    run.status = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-    return run;
-}
-
-// Runs configctl with arguments (shell-quoted by the caller); stderr joins stdout.
-ToolRun configctl(const std::string& arguments) {
-    return shell(std::string(CONFIGCTL_BINARY) + " " + arguments);
-}
+using Testing::configctl;
+using Testing::shell;
+using Testing::ToolRun;
 
 TEST(Configctl, PutThenGetPrintsTheDocumentIndented) {
     ServiceTesting::InProcessService service;

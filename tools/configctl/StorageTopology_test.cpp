@@ -7,26 +7,13 @@
 #include <string>
 
 #include "InProcessService.h"
+#include "ToolRun.h"
 
 namespace Configctl {
 namespace {
 
-struct ToolOutput {
-    int status;
-    std::string out;
-};
-
-ToolOutput configctl(const std::string& arguments) {
-    FILE* pipe = ::popen((std::string(CONFIGCTL_BINARY) + " " + arguments + " 2>&1").c_str(), "r");
-    ToolOutput run{-1, ""};
-    char buffer[4096];
-    for (std::size_t got; (got = std::fread(buffer, 1, sizeof buffer, pipe)) > 0;) {
-        run.out.append(buffer, got);
-    }
-    const int status = ::pclose(pipe);
-    run.status = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-    return run;
-}
+using Testing::configctl;
+using ToolOutput = Testing::ToolRun;
 
 class StorageCommands : public ::testing::Test {
 protected:

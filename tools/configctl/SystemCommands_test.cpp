@@ -8,27 +8,13 @@
 #include <string>
 
 #include "InProcessService.h"
+#include "ToolRun.h"
 
 namespace Configctl {
 namespace {
 
-struct ToolRun {
-    int status;
-    std::string out;
-};
-
-ToolRun configctl(const std::string& arguments) {
-    const std::string command = std::string(CONFIGCTL_BINARY) + " " + arguments + " 2>&1";
-    FILE* pipe = ::popen(command.c_str(), "r");
-    ToolRun run{-1, ""};
-    char buffer[4096];
-    for (std::size_t got; (got = std::fread(buffer, 1, sizeof buffer, pipe)) > 0;) {
-        run.out.append(buffer, got);
-    }
-    const int status = ::pclose(pipe);
-    run.status = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-    return run;
-}
+using Testing::configctl;
+using Testing::ToolRun;
 
 class SystemCommands : public ::testing::Test {
 protected:

@@ -6,6 +6,7 @@
 #include <cstdio>
 
 #include "InProcessService.h"
+#include "ToolRun.h"
 #include "workflow/WorkflowStore.h"
 
 namespace Configctl {
@@ -13,16 +14,9 @@ namespace {
 
 using ConfigurationService::Workflow::Fields;
 
+// What configctl prints for arguments.
 std::string configctl(const std::string& arguments) {
-    const std::string command = std::string(CONFIGCTL_BINARY) + " " + arguments + " 2>&1";
-    FILE* pipe = ::popen(command.c_str(), "r");
-    std::string out;
-    char buffer[4096];
-    for (std::size_t got; (got = std::fread(buffer, 1, sizeof buffer, pipe)) > 0;) {
-        out.append(buffer, got);
-    }
-    ::pclose(pipe);
-    return out;
+    return Testing::configctl(arguments).out;
 }
 
 TEST(ConfigctlWorkflow, ListsUsersAndPrintsAFolderTree) {
