@@ -13,12 +13,14 @@
 #include "Configuration/MSMQCommonConfiguration.h"
 #include "Configuration/MSMQConfiguration.h"
 #include "Configuration/RulesConfiguration.h"
+#include "StorageForms.h"
 #include "Vesk/MultiElementValue.h"
 #include "Vesk/XmlUtils.h"
 
 namespace {
 
 using Configuration::ChainUtils::Chain;
+using Configuration::StorageFields::sameLinks;
 
 void checkQueueName(const std::string& text) {
     const ACE_CString queue(text.data(), text.size());
@@ -36,20 +38,6 @@ void checkQueueName(const std::string& text) {
     if (rebuilt != text) {
         std::abort();
     }
-}
-
-bool sameLinks(const Chain& a, const Chain& b) {
-    if (a.size() != b.size()) {
-        return false;
-    }
-    for (std::size_t i = 0; i < a.size(); ++i) {
-        if (a[i].getDefinition() != b[i].getDefinition() ||
-            a[i].getDefinitionType() != b[i].getDefinitionType() ||
-            a[i].getEnabled() != b[i].getEnabled()) {
-            return false;
-        }
-    }
-    return true;
 }
 
 // Every child of children read as a chain round-trips through the element form.
