@@ -2,8 +2,10 @@
 #include "Commands.h"
 
 #include <fstream>
+#include <iostream>
 #include <iterator>
 #include <map>
+#include <set>
 #include <sstream>
 #include <stdexcept>
 
@@ -38,6 +40,12 @@ std::string pretty(const Vesk::Element& tree) {
     return text + "\n";
 }
 
+// The commands that print a list, and so can print it as JSON.
+const std::set<std::string> kJsonCommands = {
+    "archive",   "check",    "dicom-nodes", "folders",  "hosts", "items",
+    "processes", "services", "sop",         "topology", "users",
+};
+
 }  // namespace
 
 Commands::Commands(const ToolOptions& options, std::ostream& out)
@@ -68,6 +76,10 @@ void Commands::run() {
         {"users", &Commands::users},
         {"folders", &Commands::folders},
     };
+    if (m_options.json && kJsonCommands.count(m_options.command) == 0) {
+        throw std::invalid_argument("--output json: " + m_options.command +
+                                    " prints text only (see --help)");
+    }
     auto found = commands.find(m_options.command);
     if (found != commands.end()) {
         (this->*found->second)();
@@ -93,6 +105,10 @@ Configuration::HttpConfigurationClient& Commands::client() {
     return *m_client;
 }
 
+std::ostream& Commands::notes() {
+    return m_options.json || m_options.dot ? std::cerr : m_out;
+}
+
 ACE_CString Commands::host() {
     return m_options.host.empty() ? client().hostName() : ACE_CString(m_options.host.c_str());
 }
@@ -113,13 +129,12 @@ void Commands::hosts() {
         client().listHosts(hosts);
     }
     if (m_options.json) {
-        const char* separator = "";
-        m_out << "[";
+        JsonWriter json(m_out);
+        json.beginArray();
         for (const ACE_CString& name : hosts) {
-            m_out << separator << jsonString(name.c_str());
-            separator = ",";
+            json.value(name);
         }
-        m_out << "]\n";
+        json.endArray();
         return;
     }
     for (const ACE_CString& name : hosts) {
@@ -132,15 +147,16 @@ void Commands::items() {
     std::vector<Configuration::_HttpConfigurationItemInfo> items;
     client().listItems(host(), items);
     if (m_options.json) {
-        const char* separator = "";
-        m_out << "[";
+        JsonWriter json(m_out);
+        json.beginArray();
         for (const auto& item : items) {
-            m_out << separator << "{\"host\":" << jsonString(item.host.c_str())
-                  << ",\"name\":" << jsonString(item.configurationName.c_str())
-                  << ",\"lastModified\":" << jsonString(item.lastModifiedTime.c_str()) << "}";
-            separator = ",";
+            json.beginObject()
+                .field("host", item.host)
+                .field("name", item.configurationName)
+                .field("lastModified", item.lastModifiedTime)
+                .endObject();
         }
-        m_out << "]\n";
+        json.endArray();
         return;
     }
     for (const auto& item : items) {
@@ -224,9 +240,13 @@ void Commands::sopServices() {
     Vesk::Element tree;
     Configuration::StoredForm::decode(bytes.get(), length, tree);
     if (!config.readVesk(tree)) {
-        m_out << "(incomplete: the document lacks required keys or holds unreadable entries)\n";
+        notes() << "(incomplete: the document lacks required keys or holds unreadable entries)\n";
     }
-    printSopServices(config, m_out);
+    if (m_options.json) {
+        printSopServicesJson(config, m_out);
+    } else {
+        printSopServices(config, m_out);
+    }
 }
 
 // Site-wide documents live under the master's name, per-machine ones under --host.
@@ -255,7 +275,11 @@ void Commands::dicomNodes() {
     expectArguments(0, 0, "dicom-nodes [--host NAME]");
     DicomSite site;
     loadDicomSite(site);
-    printDicomNodes(site, m_out);
+    if (m_options.json) {
+        printDicomNodesJson(site, m_out);
+    } else {
+        printDicomNodes(site, m_out);
+    }
 }
 
 void Commands::check() {
@@ -263,7 +287,11 @@ void Commands::check() {
     DicomSite site;
     loadDicomSite(site);
     const std::vector<SiteProblem> problems = checkSite(site);
-    printSiteCheck(site, problems, m_out);
+    if (m_options.json) {
+        printSiteCheckJson(site, problems, m_out);
+    } else {
+        printSiteCheck(site, problems, m_out);
+    }
     if (!problems.empty()) {
         m_out.flush();
         throw CheckFailed(std::to_string(problems.size()) + " mistakes in the DICOM documents");

@@ -18,6 +18,7 @@ class ProcessesAndServicesConfiguration;
 namespace Configctl {
 
 struct DicomSite;
+class JsonWriter;
 
 class Commands {
 public:
@@ -32,6 +33,8 @@ public:
 private:
     Configuration::HttpConfigurationClient& client();
     ACE_CString host();
+    // Where remarks on incomplete documents go: stderr when stdout carries JSON or a graph.
+    std::ostream& notes();
     void expectArguments(std::size_t min, std::size_t max, const char* form) const;
 
     void hosts();
@@ -53,6 +56,7 @@ private:
     void users();
     void folders();
     void printFolder(const ACE_CString& folderId, int depth);
+    void writeFolderJson(const ACE_CString& folderId, int depth, JsonWriter& json);
     void processes();
     void services();
     void loadProcesses(Configuration::ProcessesAndServicesConfiguration& config);

@@ -4,6 +4,8 @@
 #include <array>
 #include <string>
 
+#include "JsonText.h"
+
 namespace Configctl {
 namespace {
 
@@ -68,6 +70,37 @@ void printSiteCheck(const DicomSite& site, const std::vector<SiteProblem>& probl
     }
     out << "\n"
         << problems.size() << (problems.size() == 1 ? " mistake" : " mistakes") << " found\n";
+}
+
+void printDicomNodesJson(const DicomSite& site, std::ostream& out) {
+    JsonWriter json(out);
+    json.beginArray();
+    for (const DicomNode& node : site.nodes()) {
+        json.beginObject().field("document", node.document).field("role", node.role);
+        json.field("aeTitle", node.aeTitle).key("host").optional(node.host);
+        json.key("port").optional(node.port).field("name", node.name).endObject();
+    }
+    json.endArray();
+}
+
+void printSiteCheckJson(const DicomSite& site, const std::vector<SiteProblem>& problems,
+                        std::ostream& out) {
+    JsonWriter json(out);
+    json.beginObject().key("documents").beginArray();
+    for (const DocumentStatus& status : site.documents) {
+        json.beginObject().field("path", status.path).field("stored", status.stored);
+        json.field("complete", status.complete).key("logged").beginArray();
+        for (const std::string& line : status.logged) {
+            json.value(line);
+        }
+        json.endArray().endObject();
+    }
+    json.endArray().key("problems").beginArray();
+    for (const SiteProblem& problem : problems) {
+        json.beginObject().field("document", problem.document).field("text", problem.text);
+        json.endObject();
+    }
+    json.endArray().endObject();
 }
 
 }  // namespace Configctl

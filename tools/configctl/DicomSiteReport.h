@@ -1,6 +1,6 @@
 // DicomSiteReport: what configctl prints about a site's DICOM documents: the table of remote
 // nodes, and the check's report (per document how it read and what it logged, then every
-// mistake found). Stateless; thread-safe.
+// mistake found), as text or JSON. Stateless; thread-safe.
 #pragma once
 
 #include <ostream>
@@ -16,5 +16,11 @@ void printDicomNodes(const DicomSite& site, std::ostream& out);
 // The check's report; the last line says how many mistakes were found.
 void printSiteCheck(const DicomSite& site, const std::vector<SiteProblem>& problems,
                     std::ostream& out);
+// The nodes as a JSON array of objects (document, role, aeTitle, host, port, name; host and port
+// null when not configured).
+void printDicomNodesJson(const DicomSite& site, std::ostream& out);
+// The check as a JSON object: documents (path, stored, complete, logged) and problems.
+void printSiteCheckJson(const DicomSite& site, const std::vector<SiteProblem>& problems,
+                        std::ostream& out);
 
 }  // namespace Configctl

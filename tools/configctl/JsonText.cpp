@@ -25,4 +25,73 @@ std::string jsonString(const std::string& text) {
     return out + "\"";
 }
 
+// A comma before every element or member but the first of its container.
+void JsonWriter::separate() {
+    if (m_afterKey) {
+        m_afterKey = false;
+        return;
+    }
+    if (!m_empty.empty()) {
+        if (!m_empty.back()) {
+            m_out << ',';
+        }
+        m_empty.back() = false;
+    }
+}
+
+JsonWriter& JsonWriter::raw(const std::string& token) {
+    separate();
+    m_out << token;
+    if (m_empty.empty()) {
+        m_out << '\n';
+    }
+    return *this;
+}
+
+JsonWriter& JsonWriter::close(char bracket) {
+    m_out << bracket;
+    m_empty.pop_back();
+    if (m_empty.empty()) {
+        m_out << '\n';
+    }
+    return *this;
+}
+
+JsonWriter& JsonWriter::beginObject() {
+    separate();
+    m_out << '{';
+    m_empty.push_back(true);
+    return *this;
+}
+
+JsonWriter& JsonWriter::endObject() {
+    return close('}');
+}
+
+JsonWriter& JsonWriter::beginArray() {
+    separate();
+    m_out << '[';
+    m_empty.push_back(true);
+    return *this;
+}
+
+JsonWriter& JsonWriter::endArray() {
+    return close(']');
+}
+
+JsonWriter& JsonWriter::key(const char* name) {
+    separate();
+    m_out << jsonString(name) << ':';
+    m_afterKey = true;
+    return *this;
+}
+
+JsonWriter& JsonWriter::value(const std::string& text) {
+    return raw(jsonString(text));
+}
+
+JsonWriter& JsonWriter::value(bool flag) {
+    return raw(flag ? "true" : "false");
+}
+
 }  // namespace Configctl

@@ -4,6 +4,7 @@
 #include <string>
 
 #include "Configuration/ProcessesAndServicesConfiguration.h"
+#include "JsonText.h"
 
 namespace Configctl {
 namespace {
@@ -42,6 +43,19 @@ void printProcess(const Process& process, std::ostream& out) {
     }
 }
 
+void writeProcessJson(const Process& process, JsonWriter& json) {
+    json.beginObject().field("process", process.getProcessName());
+    json.field("moduleType", process.getModuleType());
+    json.field("moduleTypeName", moduleTypeName(process.getModuleType()));
+    json.field("selected", process.isSelected()).field("executable", process.getExecutable());
+    json.field("singleton", process.isSingleton()).key("services").beginArray();
+    for (const Service& service : process.getServices()) {
+        json.beginObject().field("service", service.getServiceName());
+        json.field("enabled", service.isEnabled()).endObject();
+    }
+    json.endArray().endObject();
+}
+
 }  // namespace
 
 std::string moduleTypeName(unsigned int moduleType) {
@@ -62,6 +76,37 @@ void printProcesses(const ProcessesAndServicesConfiguration& config, std::ostrea
         << (config.isValid(reason) ? std::string("valid")
                                    : std::string("invalid: ") + reason.c_str())
         << "\n";
+}
+
+void printProcessesJson(const ProcessesAndServicesConfiguration& config, std::ostream& out) {
+    JsonWriter json(out);
+    json.beginObject().key("processes").beginArray();
+    for (const Process& process : config.getProcesses()) {
+        writeProcessJson(process, json);
+    }
+    ACE_CString reason;
+    const bool valid = config.isValid(reason);
+    json.endArray().field("documentModuleType", config.getDocumentModuleType());
+    json.field("valid", valid).key("invalidReason").optional(reason.c_str()).endObject();
+}
+
+void printServicesJson(const ProcessesAndServicesConfiguration& config,
+                       const ACE_CString& processName, std::ostream& out) {
+    JsonWriter json(out);
+    json.beginArray();
+    for (const Process& process : config.getProcesses()) {
+        if (!process.isSelected() || process.getProcessName() != processName) {
+            continue;
+        }
+        for (const Service& service : process.getServices()) {
+            if (service.isEnabled()) {
+                json.beginObject().field("service", service.getServiceName());
+                json.field("directive", service.getDefinition()).endObject();
+            }
+        }
+        break;
+    }
+    json.endArray();
 }
 
 }  // namespace Configctl

@@ -5,6 +5,7 @@
 #include <string>
 
 #include "Configuration/SOPServiceConfiguration.h"
+#include "JsonText.h"
 
 namespace Configctl {
 namespace {
@@ -46,6 +47,18 @@ void printService(const SOPService& service, std::ostream& out) {
     }
 }
 
+void writeServiceJson(const SOPService& service, JsonWriter& json) {
+    json.beginObject().field("name", service.getName()).field("uid", service.getUID());
+    json.field("objectType", Configuration::sopObjectTypeText(service.getObjectType()));
+    json.key("template").optional(service.getTemplateName().c_str());
+    json.field("offered", service.getEnabled()).key("transferSyntaxes").beginArray();
+    for (const TransferSyntax& entry : service.getTransferSyntaxList().getTransferSyntaxes()) {
+        json.beginObject().field("uid", entry.getUID()).field("name", entry.getName());
+        json.field("enabled", entry.getEnabled()).endObject();
+    }
+    json.endArray().endObject();
+}
+
 }  // namespace
 
 void printSopServices(const Configuration::SOPServiceConfiguration& config, std::ostream& out) {
@@ -64,6 +77,17 @@ void printSopServices(const Configuration::SOPServiceConfiguration& config, std:
         out << "\n";
         printService(service, out);
     }
+}
+
+void printSopServicesJson(const Configuration::SOPServiceConfiguration& config, std::ostream& out) {
+    JsonWriter json(out);
+    json.beginObject().field("description", config.getDescription());
+    json.field("version", config.getVersion()).field("releaseDate", config.getReleaseDate());
+    json.field("productVersion", config.getProductVersion()).key("services").beginArray();
+    for (const SOPService& service : config.getSOPServiceList().getSOPServices()) {
+        writeServiceJson(service, json);
+    }
+    json.endArray().endObject();
 }
 
 }  // namespace Configctl

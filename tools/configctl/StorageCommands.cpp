@@ -70,16 +70,20 @@ void loadInto(const ClientTopology& source, Configuration::ConfigDoc& document, 
 
 void Commands::topology() {
     expectArguments(0, 0, "topology [--dot] [--host NAME]");
+    if (m_options.dot && m_options.json) {
+        throw std::invalid_argument("topology: --dot or --output json, not both");
+    }
     ClientTopology source(client(), host());
     Configuration::ScopedTopologySource scoped(source);
     StorageTopology topology;
-    std::ostream& notes = m_options.dot ? std::cerr : m_out;
-    loadInto(source, topology.queues, true, notes);
-    loadInto(source, topology.locations, true, notes);
-    loadInto(source, topology.strategy, true, notes);
-    loadInto(source, topology.archive, false, notes);
+    loadInto(source, topology.queues, true, notes());
+    loadInto(source, topology.locations, true, notes());
+    loadInto(source, topology.strategy, true, notes());
+    loadInto(source, topology.archive, false, notes());
     if (m_options.dot) {
         printTopologyDot(topology, m_out);
+    } else if (m_options.json) {
+        printTopologyJson(topology, m_out);
     } else {
         printTopology(topology, m_out);
     }
@@ -89,8 +93,12 @@ void Commands::archive() {
     expectArguments(0, 0, "archive [--host NAME]");
     ClientTopology source(client(), host());
     Configuration::KelArchiveConfiguration archive;
-    loadInto(source, archive, true, m_out);
-    printArchive(archive, m_out);
+    loadInto(source, archive, true, notes());
+    if (m_options.json) {
+        printArchiveJson(archive, m_out);
+    } else {
+        printArchive(archive, m_out);
+    }
 }
 
 }  // namespace Configctl

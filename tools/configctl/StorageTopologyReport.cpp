@@ -23,17 +23,6 @@ std::string text(const ACE_CString& s) {
     return std::string(s.c_str(), s.length());
 }
 
-const char* typeName(const LocationProfile& profile) {
-    switch (profile.getType()) {
-        case LocationProfile::MainLocation:
-            return "main";
-        case LocationProfile::RemoteLocation:
-            return "remote";
-        default:
-            return "remote over WAN";
-    }
-}
-
 // What one link resolves to: its kind and the name to show.
 struct Resolved {
     enum Kind { Stack, Cache, Host, Unknown } kind;
@@ -59,17 +48,6 @@ Resolved resolve(const StorageTopology& topology, const Link& link) {
         default:
             return {Resolved::Host, text(MSMQConfiguration::HostFromQueue(value))};
     }
-}
-
-std::string stackState(const Configuration::StrategyStack& stack) {
-    std::string state = stack.getIsStackActive() == 1 ? "active" : "";
-    if (stack.getIsStackRetired() != 0) {
-        state += state.empty() ? "retired" : ", retired";
-    }
-    if (stack.getIsStackUnused() != 0) {
-        state += state.empty() ? "unused" : ", unused";
-    }
-    return state.empty() ? "standby" : state;
 }
 
 // A Graphviz identifier: the text quoted, with quotes and backslashes escaped.
@@ -111,6 +89,28 @@ void maskIn(Vesk::MultiElementValue& children) {
 
 }  // namespace
 
+const char* locationTypeName(const LocationProfile& profile) {
+    switch (profile.getType()) {
+        case LocationProfile::MainLocation:
+            return "main";
+        case LocationProfile::RemoteLocation:
+            return "remote";
+        default:
+            return "remote over WAN";
+    }
+}
+
+std::string stackState(const Configuration::StrategyStack& stack) {
+    std::string state = stack.getIsStackActive() == 1 ? "active" : "";
+    if (stack.getIsStackRetired() != 0) {
+        state += state.empty() ? "retired" : ", retired";
+    }
+    if (stack.getIsStackUnused() != 0) {
+        state += state.empty() ? "unused" : ", unused";
+    }
+    return state.empty() ? "standby" : state;
+}
+
 std::string resolvedChain(const StorageTopology& topology, const Chain& chain) {
     if (chain.empty()) {
         return "EMPTY CHAIN";
@@ -125,8 +125,8 @@ std::string resolvedChain(const StorageTopology& topology, const Chain& chain) {
 void printTopology(const StorageTopology& topology, std::ostream& out) {
     const auto& chains = topology.queues.getLocationMigrationChains();
     for (const LocationProfile& profile : topology.locations.getLocationProfiles()) {
-        out << "Location " << text(profile.getProfileName()) << " (" << typeName(profile) << ", "
-            << (profile.IsWAN() ? "WAN" : "LAN") << ")\n  servers  ";
+        out << "Location " << text(profile.getProfileName()) << " (" << locationTypeName(profile)
+            << ", " << (profile.IsWAN() ? "WAN" : "LAN") << ")\n  servers  ";
         for (const ACE_CString& server : profile.getLocalServers()) {
             out << text(server) << (&server == &profile.getLocalServers().back() ? "" : ", ");
         }
@@ -200,7 +200,8 @@ void printTopologyDot(const StorageTopology& topology, std::ostream& out) {
     const auto& chains = topology.queues.getLocationMigrationChains();
     for (const LocationProfile& profile : topology.locations.getLocationProfiles()) {
         const std::string name = text(profile.getProfileName());
-        std::string label = name + "\n" + typeName(profile) + (profile.IsWAN() ? ", WAN" : "");
+        std::string label =
+            name + "\n" + locationTypeName(profile) + (profile.IsWAN() ? ", WAN" : "");
         for (const ACE_CString& server : profile.getLocalServers()) {
             label += "\n" + text(server);
         }

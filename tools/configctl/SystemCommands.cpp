@@ -27,7 +27,7 @@ void Commands::loadProcesses(Configuration::ProcessesAndServicesConfiguration& c
     Vesk::Element tree;
     Configuration::StoredForm::decode(bytes.get(), length, tree);
     if (!config.readVesk(tree)) {
-        m_out << "(incomplete: the table lacks keys; defaults are shown for them)\n";
+        notes() << "(incomplete: the table lacks keys; defaults are shown for them)\n";
     }
 }
 
@@ -35,7 +35,11 @@ void Commands::processes() {
     expectArguments(0, 0, "processes [--host NAME]");
     Configuration::ProcessesAndServicesConfiguration config;
     loadProcesses(config);
-    printProcesses(config, m_out);
+    if (m_options.json) {
+        printProcessesJson(config, m_out);
+    } else {
+        printProcesses(config, m_out);
+    }
 }
 
 void Commands::services() {
@@ -50,6 +54,10 @@ void Commands::services() {
     if (!known) {
         throw Configuration::HttpConfigurationPathNotFoundException(
             ACE_CString("selected process ") + name + " of host " + host() + " not found");
+    }
+    if (m_options.json) {
+        printServicesJson(config, name, m_out);
+        return;
     }
     const ACE_CString directives = config.getServiceDirectives(name);
     m_out << directives.c_str();
