@@ -7,6 +7,7 @@
 #include <utility>
 
 #include "Quorvex/StreamException.h"
+#include "XmlDirectReader.h"
 #include "XmlTreeReader.h"
 #include "XmlTreeWriter.h"
 
@@ -30,9 +31,26 @@ void checkSize(std::size_t len) {
     }
 }
 
-// Parses text (which it uses as pugixml's working buffer) into out.
+void checkRootName(const Element& tree, const ACE_CString& name) {
+    if (!name.empty() && !(tree.key() == name)) {
+        throw TrelException("Vesk::XmlUtils: the root element is '" +
+                            std::string(tree.key().c_str(), tree.key().length()) + "', expected '" +
+                            std::string(name.c_str(), name.length()) + "'");
+    }
+}
+
+// Parses text (which it uses as pugixml's working buffer) into out. Text in the writer's own
+// shape is read directly, without a DOM; pugixml reads (or refuses) everything else.
 void parseInPlace(std::string& text, Element& out, const ACE_CString& name) {
     checkSize(text.size());
+    {
+        Element direct;
+        if (XmlDirectReader::read(text.data(), text.size(), direct)) {
+            checkRootName(direct, name);
+            out = std::move(direct);
+            return;
+        }
+    }
     if (std::memchr(text.data(), '\0', text.size()) != nullptr) {
         throw TrelException("Vesk::XmlUtils: the XML text holds a NUL byte");
     }
@@ -46,11 +64,7 @@ void parseInPlace(std::string& text, Element& out, const ACE_CString& name) {
                             std::to_string(result.offset) + ": " + result.description());
     }
     Element tree = XmlTreeReader::read(doc);
-    if (!name.empty() && !(tree.key() == name)) {
-        throw TrelException("Vesk::XmlUtils: the root element is '" +
-                            std::string(tree.key().c_str(), tree.key().length()) + "', expected '" +
-                            std::string(name.c_str(), name.length()) + "'");
-    }
+    checkRootName(tree, name);
     out = std::move(tree);
 }
 
