@@ -187,21 +187,38 @@ bool DirectoryStore::remove(const ACE_CString& host, const ACE_CString& name) {
     return true;
 }
 
-std::vector<StoredItem> DirectoryStore::list(const ACE_CString& host) const {
-    std::vector<StoredItem> items;
-    std::shared_lock<std::shared_mutex> lock(m_itemsMutex);
+template <typename Visit>
+std::size_t DirectoryStore::visitLocked(const ACE_CString& host, const Visit& visit) const {
+    std::size_t count = 0;
     if (host == kAllHosts) {
         for (const auto& entry : m_items) {
-            items.push_back(entry.second.item);
+            visit(entry.second.item);
+            ++count;
         }
-        return items;
+        return count;
     }
     const std::string prefix = Quorvex::HostKey(toStd(host)) + std::string(1, '\0');
     for (auto it = m_items.lower_bound(prefix);
          it != m_items.end() && it->first.compare(0, prefix.size(), prefix) == 0; ++it) {
-        items.push_back(it->second.item);
+        visit(it->second.item);
+        ++count;
     }
+    return count;
+}
+
+std::vector<StoredItem> DirectoryStore::list(const ACE_CString& host) const {
+    std::vector<StoredItem> items;
+    // Counted first so the copies are made once: StoredItem's strings copy on every move.
+    std::shared_lock<std::shared_mutex> lock(m_itemsMutex);
+    items.reserve(visitLocked(host, [](const StoredItem&) {}));
+    visitLocked(host, [&items](const StoredItem& item) { items.push_back(item); });
     return items;
+}
+
+std::size_t DirectoryStore::visit(const ACE_CString& host,
+                                  const std::function<void(const StoredItem&)>& visit) const {
+    std::shared_lock<std::shared_mutex> lock(m_itemsMutex);
+    return visitLocked(host, visit);
 }
 
 std::size_t DirectoryStore::size() const {

@@ -16,6 +16,7 @@
 #include <atomic>
 #include <cstddef>
 #include <cstdint>
+#include <functional>
 #include <map>
 #include <memory>
 #include <mutex>
@@ -65,6 +66,10 @@ public:
     bool remove(const ACE_CString& host, const ACE_CString& name);
     // The items of host (kAllHosts: of every host), ordered by host and name.
     std::vector<StoredItem> list(const ACE_CString& host) const;
+    // Calls visit on each item of host in list() order without copying them, under the read
+    // lock: visit must be quick and must not call into the store. Returns how many it visited.
+    std::size_t visit(const ACE_CString& host,
+                      const std::function<void(const StoredItem&)>& visit) const;
     // How many items are stored.
     std::size_t size() const;
 
@@ -87,6 +92,9 @@ private:
     };
 
     void load();
+    // visit on each item of host; the caller holds m_itemsMutex.
+    template <typename Visit>
+    std::size_t visitLocked(const ACE_CString& host, const Visit& visit) const;
     void loadItem(const std::string& fileName);
     void loadRegistry();
     std::int64_t nextTime();
