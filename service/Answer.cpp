@@ -1,7 +1,53 @@
 // Answer texts written element by element, with text escaped.
 #include "Answer.h"
 
+#include <algorithm>
+
 namespace ConfigurationService {
+namespace {
+
+const char kBase64Alphabet[] = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
+
+// Writes the Base64 of length bytes (a multiple of 3 unless last) to out; returns its length.
+std::size_t encodeBase64(const unsigned char* in, std::size_t length, char* out) {
+    char* const start = out;
+    std::size_t i = 0;
+    for (; i + 3 <= length; i += 3) {
+        const unsigned v = (unsigned(in[i]) << 16) | (unsigned(in[i + 1]) << 8) | in[i + 2];
+        *out++ = kBase64Alphabet[v >> 18];
+        *out++ = kBase64Alphabet[(v >> 12) & 63];
+        *out++ = kBase64Alphabet[(v >> 6) & 63];
+        *out++ = kBase64Alphabet[v & 63];
+    }
+    if (i < length) {
+        const bool two = i + 1 < length;
+        const unsigned v = (unsigned(in[i]) << 16) | (two ? unsigned(in[i + 1]) << 8 : 0u);
+        *out++ = kBase64Alphabet[v >> 18];
+        *out++ = kBase64Alphabet[(v >> 12) & 63];
+        *out++ = two ? kBase64Alphabet[(v >> 6) & 63] : '=';
+        *out++ = '=';
+    }
+    return static_cast<std::size_t>(out - start);
+}
+
+// Appends text with &, < and > escaped.
+void appendEscaped(std::string& out, const char* text, std::size_t length) {
+    const char* const end = text + length;
+    while (text != end) {
+        const char* plain = text;
+        while (plain != end && *plain != '&' && *plain != '<' && *plain != '>') {
+            ++plain;
+        }
+        out.append(text, plain);
+        if (plain == end) {
+            break;
+        }
+        out += *plain == '&' ? "&amp;" : *plain == '<' ? "&lt;" : "&gt;";
+        text = plain + 1;
+    }
+}
+
+}  // namespace
 
 Answer::Answer(const std::string& rootTag) : m_root(rootTag) {
     m_text.reserve(256);
@@ -11,9 +57,31 @@ Answer::Answer(const std::string& rootTag) : m_root(rootTag) {
 }
 
 Answer& Answer::element(const std::string& tag, const std::string& text) {
+    return element(tag, text.data(), text.size());
+}
+
+Answer& Answer::element(const std::string& tag, const char* text, std::size_t length) {
     open(tag);
-    m_text += escape(text);
+    appendEscaped(m_text, text, length);
     return close(tag);
+}
+
+Answer& Answer::base64(const std::string& tag, const void* data, std::size_t length) {
+    open(tag);
+    // Encoded through a small buffer that stays in cache: the answer is written once and never
+    // zero-filled first.
+    constexpr std::size_t kChunk = 3 * 1024;
+    char encoded[kChunk / 3 * 4];
+    const auto* bytes = static_cast<const unsigned char*>(data);
+    for (std::size_t at = 0; at < length; at += kChunk) {
+        const std::size_t n = std::min(kChunk, length - at);
+        m_text.append(encoded, encodeBase64(bytes + at, n, encoded));
+    }
+    return close(tag);
+}
+
+void Answer::reserve(std::size_t more) {
+    m_text.reserve(m_text.size() + more + m_root.size() + 3);
 }
 
 Answer& Answer::trusted(const std::string& tag, const char* text, std::size_t length) {
@@ -62,23 +130,21 @@ std::string Answer::failure(const std::string& operation, const std::string& mes
 
 std::string Answer::escape(const std::string& text) {
     std::string out;
-    out.reserve(text.size());
-    for (char c : text) {
-        switch (c) {
-            case '&':
-                out += "&amp;";
-                break;
-            case '<':
-                out += "&lt;";
-                break;
-            case '>':
-                out += "&gt;";
-                break;
-            default:
-                out += c;
-        }
-    }
+    out.reserve(elementSize("", text.data(), text.size()) - 5);
+    appendEscaped(out, text.data(), text.size());
     return out;
+}
+
+std::size_t Answer::elementSize(const std::string& tag, const char* text, std::size_t length) {
+    std::size_t size = 2 * tag.size() + 5 + length;
+    for (const char* end = text + length; text != end; ++text) {
+        size += *text == '&' ? 4 : (*text == '<' || *text == '>') ? 3 : 0;
+    }
+    return size;
+}
+
+std::size_t Answer::base64ElementSize(const std::string& tag, std::size_t length) {
+    return 2 * tag.size() + 5 + base64Length(length);
 }
 
 }  // namespace ConfigurationService

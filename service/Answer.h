@@ -18,8 +18,15 @@ public:
 
     // Appends <tag>escaped text</tag>.
     Answer& element(const std::string& tag, const std::string& text);
+    Answer& element(const std::string& tag, const char* text, std::size_t length);
     // Appends <tag>text</tag> for text known to need no escaping (Base64, digits).
     Answer& trusted(const std::string& tag, const char* text, std::size_t length);
+    // Appends <tag>Base64 of the bytes</tag>, encoded in place; with reserve() beforehand the
+    // answer is built in one buffer of its final size.
+    Answer& base64(const std::string& tag, const void* data, std::size_t length);
+    // Makes room for more characters of elements plus the root's closing tag, so that finish()
+    // returns a text whose capacity is its size when exactly that much is appended.
+    void reserve(std::size_t more);
     // Opens and closes a nesting element.
     Answer& open(const std::string& tag);
     Answer& close(const std::string& tag);
@@ -33,6 +40,11 @@ public:
                                const std::string& errorKey = std::string());
     // Escapes &, < and > for element text.
     static std::string escape(const std::string& text);
+    // The length of <tag>escaped text</tag>, and of <tag>Base64 of length bytes</tag>.
+    static std::size_t elementSize(const std::string& tag, const char* text, std::size_t length);
+    static std::size_t base64ElementSize(const std::string& tag, std::size_t length);
+    // The length of the Base64 text of length bytes.
+    static std::size_t base64Length(std::size_t length) { return (length + 2) / 3 * 4; }
 
 private:
     std::string m_root;

@@ -56,6 +56,29 @@ StoredItem findItem(const DirectoryStore& store, const Request& request) {
     return item;
 }
 
+// Tags written per item of a listing, built once.
+const std::string kItemTag = "ConfigurationItem";
+const std::string kHostTag = "HostName";
+const std::string kNameTag = "ConfigurationName";
+const std::string kTimeTag = "LastModifiedTime";
+const std::string kConfigurationTag = "Configuration";
+
+std::size_t listedSize(const StoredItem& item) {
+    return 2 * kItemTag.size() + 5 +
+           Answer::elementSize(kHostTag, item.host.c_str(), item.host.length()) +
+           Answer::elementSize(kNameTag, item.name.c_str(), item.name.length()) +
+           Answer::elementSize(kTimeTag, "", TimeText::kLength);
+}
+
+void appendListed(Answer& answer, const StoredItem& item) {
+    char time[TimeText::kLength];
+    answer.open(kItemTag);
+    answer.element(kHostTag, item.host.c_str(), item.host.length());
+    answer.element(kNameTag, item.name.c_str(), item.name.length());
+    answer.element(kTimeTag, time, TimeText::format(item.lastModifiedMs, time));
+    answer.close(kItemTag);
+}
+
 Reply storedReply(const std::string& operation, std::int64_t time) {
     return Reply{
         200,
@@ -114,11 +137,15 @@ Reply ItemOperations::storeMaster(const Request& request) {
 
 Reply ItemOperations::retrieve(const Request& request) {
     const StoredItem item = findItem(m_context.store, request);
-    const ACE_CString base64 = Base64Coder::Encode(
-        reinterpret_cast<const unsigned char*>(item.bytes->data()), item.bytes->size());
+    const std::string& bytes = *item.bytes;
+    char time[TimeText::kLength];
+    const std::size_t timeLength = TimeText::format(item.lastModifiedMs, time);
+    // One buffer of the answer's final size; the Base64 text is written straight into it.
     Answer answer = Answer::success("Retrieve");
-    answer.element("LastModifiedTime", TimeText::format(item.lastModifiedMs));
-    answer.trusted("Configuration", base64.c_str(), base64.length());
+    answer.reserve(Answer::elementSize(kTimeTag, time, timeLength) +
+                   Answer::base64ElementSize(kConfigurationTag, bytes.size()));
+    answer.element(kTimeTag, time, timeLength);
+    answer.base64(kConfigurationTag, bytes.data(), bytes.size());
     return Reply{200, answer.finish()};
 }
 
@@ -143,15 +170,13 @@ Reply ItemOperations::lastModifiedTime(const Request& request) {
 }
 
 Reply ItemOperations::listItems(const Request& request) {
-    const std::string& host = request.required("Host");
+    const ACE_CString host(request.required("Host").c_str());
+    // Sized in a first pass and written in a second, reading the stored items in place.
+    std::size_t size = 0;
+    m_context.store.visit(host, [&size](const StoredItem& item) { size += listedSize(item); });
     Answer answer = Answer::success("ListItems");
-    for (const StoredItem& item : m_context.store.list(host.c_str())) {
-        answer.open("ConfigurationItem");
-        answer.element("HostName", std::string(item.host.c_str(), item.host.length()));
-        answer.element("ConfigurationName", std::string(item.name.c_str(), item.name.length()));
-        answer.element("LastModifiedTime", TimeText::format(item.lastModifiedMs));
-        answer.close("ConfigurationItem");
-    }
+    answer.reserve(size);
+    m_context.store.visit(host, [&answer](const StoredItem& item) { appendListed(answer, item); });
     return Reply{200, answer.finish()};
 }
 

@@ -3,6 +3,7 @@
 // fraction digits and offset form. Stateless; thread-safe.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <string>
 
@@ -10,8 +11,12 @@ namespace ConfigurationService {
 
 class TimeText {
 public:
-    // The text of a time in milliseconds since 1970 UTC.
+    // Characters of a formatted time ("YYYY-MM-DDThh:mm:ss.fff").
+    static constexpr std::size_t kLength = 23;
+    // The text of a time in milliseconds since 1970 UTC; empty outside the years 0000-9999.
     static std::string format(std::int64_t milliseconds);
+    // The same text written to out (room for kLength characters); returns its length.
+    static std::size_t format(std::int64_t milliseconds, char* out);
     // Parses a time text; throws std::invalid_argument when it is not a date and time.
     static std::int64_t parse(const std::string& text);
     // The current time in milliseconds since 1970 UTC.
