@@ -1,7 +1,7 @@
 // FrontContext: what every connection of the HTTP front shares: the limits, the ticket check
 // and the routes whose handlers answer bodies, the worker pool for operations that may block, and
-// the connection and body-memory accounts. Owned by HttpFront, which outlives its connections. The
-// members are thread-safe.
+// the connection and body-memory accounts, and the trim after large traffic. Owned by HttpFront,
+// which outlives its connections. The members are thread-safe.
 #pragma once
 
 #include <boost/asio/thread_pool.hpp>
@@ -9,6 +9,7 @@
 #include <cstddef>
 
 #include "BodyBudget.h"
+#include "MemoryTrimmer.h"
 #include "PeerLimiter.h"
 #include "Routes.h"
 #include "TicketCheck.h"
@@ -28,6 +29,7 @@ struct FrontContext {
     boost::asio::thread_pool& workers;
     PeerLimiter& peers;
     BodyBudget& bodies;
+    MemoryTrimmer& trimmer;
 };
 
 }  // namespace ConfigurationService

@@ -1,8 +1,6 @@
 // One connection of the HTTP front over Boost.Beast.
 #include "HttpConnection.h"
 
-#include <malloc.h>
-
 #include <boost/asio/dispatch.hpp>
 #include <boost/asio/post.hpp>
 #include <boost/beast/core/bind_handler.hpp>
@@ -291,9 +289,10 @@ void HttpConnection::onSent(ErrorCode error, bool close) {
     m_response = Response();
     m_served = true;
     if (m_large) {
-        // Large bodies leave free pages in the allocator's arenas; give them back.
+        // Large bodies leave free pages in the allocator's arenas; they go back once large
+        // traffic pauses.
         m_large = false;
-        net::post(m_front.workers, [] { ::malloc_trim(0); });
+        m_front.trimmer.noteLarge();
     }
     if (error) {
         return;

@@ -22,6 +22,8 @@ using net::ip::tcp;
 constexpr int kListenBacklog = 1024;
 constexpr int kAcceptBurst = 64;                       // connections taken from the backlog at once
 constexpr std::chrono::milliseconds kAcceptPause{50};  // after running out of descriptors
+// Free memory goes back to the system once large traffic has paused this long.
+constexpr std::chrono::milliseconds kTrimAfterQuiet{200};
 
 FrontLimits limitsOf(const ServiceOptions& options) {
     FrontLimits limits;
@@ -42,7 +44,8 @@ struct HttpFront::State {
           acceptor(*io.front()),
           pause(*io.front()),
           workers(static_cast<std::size_t>(options.threads)),
-          context{limitsOf(options), tickets, routes, workers, peers, bodies} {}
+          trimmer(workers, kTrimAfterQuiet),
+          context{limitsOf(options), tickets, routes, workers, peers, bodies, trimmer} {}
 
     static std::vector<std::unique_ptr<net::io_context>> makeContexts(int count);
     void listen(const ServiceOptions& options);
@@ -62,6 +65,7 @@ struct HttpFront::State {
     tcp::acceptor acceptor;
     net::steady_timer pause;
     net::thread_pool workers;  // declared after io: joined before io's pending work is dropped
+    MemoryTrimmer trimmer;     // runs on workers
     FrontContext context;
     std::atomic<bool> running{false};
     int port = 0;
@@ -182,6 +186,7 @@ HttpFront::HttpFront(const ServiceOptions& options, const TicketCheck& tickets,
 
 HttpFront::~HttpFront() {
     stop();
+    m_state->trimmer.cancel();
     m_state->workers.join();
 }
 
