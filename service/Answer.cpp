@@ -1,34 +1,12 @@
 // Answer texts written element by element, with text escaped.
 #include "Answer.h"
 
+#include "Base64Text.h"
+
 #include <algorithm>
 
 namespace ConfigurationService {
 namespace {
-
-const char kBase64Alphabet[] = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
-
-// Writes the Base64 of length bytes (a multiple of 3 unless last) to out; returns its length.
-std::size_t encodeBase64(const unsigned char* in, std::size_t length, char* out) {
-    char* const start = out;
-    std::size_t i = 0;
-    for (; i + 3 <= length; i += 3) {
-        const unsigned v = (unsigned(in[i]) << 16) | (unsigned(in[i + 1]) << 8) | in[i + 2];
-        *out++ = kBase64Alphabet[v >> 18];
-        *out++ = kBase64Alphabet[(v >> 12) & 63];
-        *out++ = kBase64Alphabet[(v >> 6) & 63];
-        *out++ = kBase64Alphabet[v & 63];
-    }
-    if (i < length) {
-        const bool two = i + 1 < length;
-        const unsigned v = (unsigned(in[i]) << 16) | (two ? unsigned(in[i + 1]) << 8 : 0u);
-        *out++ = kBase64Alphabet[v >> 18];
-        *out++ = kBase64Alphabet[(v >> 12) & 63];
-        *out++ = two ? kBase64Alphabet[(v >> 6) & 63] : '=';
-        *out++ = '=';
-    }
-    return static_cast<std::size_t>(out - start);
-}
 
 // Appends text with &, < and > escaped.
 void appendEscaped(std::string& out, const char* text, std::size_t length) {
@@ -75,7 +53,7 @@ Answer& Answer::base64(const std::string& tag, const void* data, std::size_t len
     const auto* bytes = static_cast<const unsigned char*>(data);
     for (std::size_t at = 0; at < length; at += kChunk) {
         const std::size_t n = std::min(kChunk, length - at);
-        m_text.append(encoded, encodeBase64(bytes + at, n, encoded));
+        m_text.append(encoded, Base64Text::encode(bytes + at, n, encoded));
     }
     return close(tag);
 }
@@ -85,7 +63,6 @@ void Answer::reserve(std::size_t more) {
 }
 
 Answer& Answer::trusted(const std::string& tag, const char* text, std::size_t length) {
-    m_text.reserve(m_text.size() + length + 2 * tag.size() + 16);
     open(tag);
     m_text.append(text, length);
     return close(tag);
@@ -136,7 +113,7 @@ std::string Answer::escape(const std::string& text) {
 }
 
 std::size_t Answer::elementSize(const std::string& tag, const char* text, std::size_t length) {
-    std::size_t size = 2 * tag.size() + 5 + length;
+    std::size_t size = plainElementSize(tag, length);
     for (const char* end = text + length; text != end; ++text) {
         size += *text == '&' ? 4 : (*text == '<' || *text == '>') ? 3 : 0;
     }
@@ -144,7 +121,7 @@ std::size_t Answer::elementSize(const std::string& tag, const char* text, std::s
 }
 
 std::size_t Answer::base64ElementSize(const std::string& tag, std::size_t length) {
-    return 2 * tag.size() + 5 + base64Length(length);
+    return plainElementSize(tag, Base64Text::encodedLength(length));
 }
 
 }  // namespace ConfigurationService

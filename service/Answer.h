@@ -40,11 +40,14 @@ public:
                                const std::string& errorKey = std::string());
     // Escapes &, < and > for element text.
     static std::string escape(const std::string& text);
-    // The length of <tag>escaped text</tag>, and of <tag>Base64 of length bytes</tag>.
+    // The length of <tag>escaped text</tag>.
     static std::size_t elementSize(const std::string& tag, const char* text, std::size_t length);
+    // The length of <tag>text</tag> for length characters that need no escaping.
+    static std::size_t plainElementSize(const std::string& tag, std::size_t length) {
+        return 2 * tag.size() + 5 + length;
+    }
+    // The length of <tag>Base64 of length bytes</tag>.
     static std::size_t base64ElementSize(const std::string& tag, std::size_t length);
-    // The length of the Base64 text of length bytes.
-    static std::size_t base64Length(std::size_t length) { return (length + 2) / 3 * 4; }
 
 private:
     std::string m_root;

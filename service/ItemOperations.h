@@ -1,12 +1,13 @@
 // ItemOperations: the operations on stored documents: "Store", "StoreMaster", "Retrieve",
 // "RetrieveItems", "Exists", "GetLastModifiedTime" and "ListItems". Documents travel as Base64
-// text; "RetrieveItems" answers the element-tree XML of the requested documents. Holds only a
-// reference to the context; thread-safe.
+// text; "RetrieveItems" answers the element-tree XML of the requested documents. Holds a
+// reference to the context and the Base64 texts of large documents; thread-safe.
 #pragma once
 
 #include <cstdint>
 #include <string>
 
+#include "Base64Cache.h"
 #include "Operations.h"
 #include "ServiceContext.h"
 
@@ -17,7 +18,8 @@ public:
     // Separators of the names in a "RetrieveItems" request (either one).
     static constexpr const char* kNameSeparators = ";,";
 
-    explicit ItemOperations(ServiceContext& context) : m_context(context) {}
+    explicit ItemOperations(ServiceContext& context)
+        : m_context(context), m_base64(kCachedBase64Budget) {}
     // Adds the operations to the table.
     void registerInto(Operations& table);
 
@@ -32,7 +34,12 @@ private:
 
     std::int64_t storeHere(const Request& request, const std::string& bytes, std::int64_t time);
 
+    // Documents from this size on keep their Base64 text between retrieves, up to the budget.
+    static constexpr std::size_t kCachedBase64From = 16 * 1024;
+    static constexpr std::size_t kCachedBase64Budget = 64u << 20;
+
     ServiceContext& m_context;
+    Base64Cache m_base64;
 };
 
 }  // namespace ConfigurationService
