@@ -3,23 +3,23 @@
 # configuration-service (the service, configctl, the unit, the man pages). Build them from a tree
 # configured with -DCMAKE_INSTALL_PREFIX=/usr (scripts/package-test.sh does).
 #
-# Lintian tags that remain, and why:
-#   bogus-mail-host(-in-debian-changelog)  the placeholder QUORVEX_PACKAGE_CONTACT; a release sets it
-#   copyright-without-copyright-notice     packaging/deb/copyright names no holder yet
-#   initial-upload-closes-no-bugs          packages for our own sites, no Debian bug to close
-#   maintscript-calls-ldconfig             CPack writes the ldconfig calls itself; the ldconfig
-#                                          trigger (packaging/deb/triggers) is there as well
-#   shared-library-lacks-version           libServerInterop.so is a module loaded by that exact
-#                                          name with dlopen, never linked
+# The maintainer (QUORVEX_PACKAGE_CONTACT), the lintian tags that remain and why: see
+# docs/PACKAGING.md.
 
 set(CPACK_GENERATOR DEB)
 set(CPACK_PACKAGE_NAME configuration)
-set(CPACK_PACKAGE_VENDOR "Configuration developers")
-# The maintainer named in the packages; set it to the team's address when releasing.
-set(QUORVEX_PACKAGE_CONTACT "Configuration developers <configuration@localhost>"
-    CACHE STRING "Maintainer field of the Debian packages")
+set(CPACK_PACKAGE_VENDOR "Quorvex Configuration Team")
+# The maintainer named in the packages and their changelog; a site that rebuilds the packages
+# sets its own.
+set(QUORVEX_PACKAGE_CONTACT "Quorvex Configuration Team <configuration@quorvex.example>"
+    CACHE STRING "Maintainer field of the Debian packages (Name <address>)")
+# Trees configured before the team's address was set hold a placeholder lintian rejects.
+if(QUORVEX_PACKAGE_CONTACT MATCHES "@localhost>$")
+  set_property(CACHE QUORVEX_PACKAGE_CONTACT
+               PROPERTY VALUE "Quorvex Configuration Team <configuration@quorvex.example>")
+endif()
 set(CPACK_PACKAGE_CONTACT "${QUORVEX_PACKAGE_CONTACT}")
-set(CPACK_PACKAGE_DESCRIPTION_SUMMARY "configuration library and service of a DICOM archive")
+# No CPACK_PACKAGE_DESCRIPTION_SUMMARY: CPack would put it before each package's own synopsis.
 set(CPACK_PACKAGING_INSTALL_PREFIX ${CMAKE_INSTALL_PREFIX})
 set(CPACK_DEB_COMPONENT_INSTALL ON)
 set(CPACK_COMPONENTS_ALL runtime dev service)
@@ -34,22 +34,22 @@ set(CPACK_DEBIAN_PACKAGE_GENERATE_SHLIBS ON)
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS ${PROJECT_BINARY_DIR}/platform
                                                 ${PROJECT_BINARY_DIR}/configuration)
 set(CPACK_DEBIAN_PACKAGE_SECTION libs)
-set(CPACK_DEBIAN_PACKAGE_HOMEPAGE "https://localhost/configuration")
+set(CPACK_DEBIAN_PACKAGE_HOMEPAGE "https://quorvex.example/configuration")
 
 set(CPACK_DEBIAN_RUNTIME_PACKAGE_NAME libconfiguration0)
 set(CPACK_DEBIAN_RUNTIME_PACKAGE_SECTION libs)
 set(CPACK_DEBIAN_RUNTIME_DESCRIPTION
-    "configuration library of a DICOM archive\n The shared libraries every server process of the archive links to read and\n write its typed configuration, and the service-ticket module.")
+    "configuration library of a DICOM archive\nThe shared libraries every server process of the archive links to read and\nwrite its typed configuration, and the service-ticket module.")
 set(CPACK_DEBIAN_DEV_PACKAGE_NAME libconfiguration-dev)
 set(CPACK_DEBIAN_DEV_PACKAGE_SECTION libdevel)
 set(CPACK_DEBIAN_DEV_PACKAGE_DEPENDS "libconfiguration0 (= ${QUORVEX_DEB_VERSION}), libace-dev")
 set(CPACK_DEBIAN_DEV_DESCRIPTION
-    "configuration library of a DICOM archive - development files\n Public headers, the CMake package Configuration::Configuration, the\n pkg-config file, documentation and examples.")
+    "configuration library of a DICOM archive - development files\nPublic headers, the CMake package Configuration::Configuration, the\npkg-config file, documentation and examples.")
 set(CPACK_DEBIAN_SERVICE_PACKAGE_NAME configuration-service)
 set(CPACK_DEBIAN_SERVICE_PACKAGE_SECTION admin)
 set(CPACK_DEBIAN_SERVICE_PACKAGE_DEPENDS "libconfiguration0 (= ${QUORVEX_DEB_VERSION}), adduser")
 set(CPACK_DEBIAN_SERVICE_DESCRIPTION
-    "configuration service of a DICOM archive and its tool\n The per-machine configuration web service (systemd unit\n configuration-service.service) and configctl, the administrators' tool.")
+    "configuration service of a DICOM archive and its tool\nThe per-machine configuration web service (systemd unit\nconfiguration-service.service) and configctl, the administrators' tool.")
 set(CPACK_DEBIAN_RUNTIME_PACKAGE_CONTROL_EXTRA ${PROJECT_SOURCE_DIR}/packaging/deb/triggers)
 set(CPACK_DEBIAN_SERVICE_PACKAGE_CONTROL_EXTRA
     ${PROJECT_SOURCE_DIR}/packaging/deb/conffiles ${PROJECT_SOURCE_DIR}/packaging/deb/postinst ${PROJECT_SOURCE_DIR}/packaging/deb/prerm
