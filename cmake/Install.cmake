@@ -13,6 +13,9 @@ include(CMakePackageConfigHelpers)
 set(QUORVEX_INCLUDE_PREFIX ${CMAKE_INSTALL_INCLUDEDIR}/quorvex)
 set(QUORVEX_CMAKE_DIR ${CMAKE_INSTALL_LIBDIR}/cmake/Configuration)
 
+# In-tree users (add_subdirectory) link the same name as users of the installed package.
+add_library(Configuration::Configuration ALIAS Configuration)
+
 foreach(target Configuration Vesk QuorvexCommon)
   target_include_directories(${target} INTERFACE $<INSTALL_INTERFACE:${QUORVEX_INCLUDE_PREFIX}>)
 endforeach()
