@@ -4,18 +4,13 @@
 #include <signal.h>
 #include <sys/wait.h>
 
-#include <atomic>
-#include <chrono>
 #include <filesystem>
-#include <mutex>
+#include <optional>
 #include <random>
-#include <thread>
 
+#include "CrashBurst.h"
 #include "Quorvex/Base64Coder.h"
 #include "RawPost.h"
-#include "ServiceProcess.h"
-#include "TicketFile.h"
-#include "testing/ScratchDir.h"
 
 namespace ConfigurationService {
 namespace {
@@ -49,106 +44,59 @@ std::string storeBody(const std::string& name, const std::string& bytes) {
            "</ConfigurationName><Configuration>" + base64(bytes) + "</Configuration></Store>";
 }
 
-class Burst {
-public:
-    Burst(int port, std::string cookie) : m_port(port), m_cookie(std::move(cookie)) {}
-
-    // Each writer stores its documents one after another until a store is not answered.
-    void run(int writer) {
-        for (int i = 0; i < kMaxStoresPerWriter; ++i) {
-            const ServiceTesting::RawAnswer answer = ServiceTesting::rawPost(
-                m_port, storeBody(docName(writer, i), payload(writer, i)), m_cookie);
-            if (elementText(answer.body, "ReturnStatus") != "1") {
-                return;
-            }
-            std::lock_guard<std::mutex> lock(m_mutex);
-            m_acknowledged.emplace_back(writer, i);
-            ++m_count;
-        }
-    }
-    int count() const { return m_count; }
-    std::vector<std::pair<int, int>> acknowledged() {
-        std::lock_guard<std::mutex> lock(m_mutex);
-        return m_acknowledged;
-    }
-
-private:
-    int m_port;
-    std::string m_cookie;
-    std::mutex m_mutex;
-    std::vector<std::pair<int, int>> m_acknowledged;
-    std::atomic<int> m_count{0};
-};
-
 TEST(CrashSafety, AcknowledgedStoresSurviveSigkill) {
-    Quorvex::Testing::ScratchDir scratch;
-    const ServiceTesting::TicketFile ticket(scratch.path(), "crash-ticket");
-    const std::string cookie = "OrvelWebApplication=crash-ticket";
-    ServiceTesting::ServiceProcess::Settings settings;
-    settings.storeDirectory = scratch.file("store");
-    settings.eventDirectory = scratch.file("events");
-    settings.hostName = "Crash";
-
-    std::vector<std::pair<int, int>> acknowledged;
+    const ServiceTesting::CrashScene scene("crash-ticket", "Crash");
+    const std::string cookie = scene.cookie();
+    std::vector<ServiceTesting::Acknowledged> acknowledged;
     {
-        ServiceTesting::ServiceProcess service(settings);
-        Burst burst(service.port(), cookie);
-        std::vector<std::thread> writers;
-        for (int w = 0; w < kWriters; ++w) {
-            writers.emplace_back([&burst, w] { burst.run(w); });
-        }
-        for (int i = 0; i < 1000 && burst.count() < kAcksBeforeKill; ++i) {
-            std::this_thread::sleep_for(std::chrono::milliseconds(10));
-        }
-        EXPECT_NE(service.stop(SIGKILL), -1);
-        for (std::thread& writer : writers) {
-            writer.join();
-        }
-        acknowledged = burst.acknowledged();
+        ServiceTesting::ServiceProcess service(scene.settings());
+        const int port = service.port();
+        acknowledged = ServiceTesting::killMidBurst(
+            service, kWriters, kMaxStoresPerWriter, kAcksBeforeKill, 10000,
+            [&](int writer, int index) -> std::optional<std::string> {
+                const ServiceTesting::RawAnswer answer = ServiceTesting::rawPost(
+                    port, storeBody(docName(writer, index), payload(writer, index)), cookie);
+                if (elementText(answer.body, "ReturnStatus") != "1") {
+                    return std::nullopt;
+                }
+                return answer.body;
+            });
     }
     ASSERT_GE(acknowledged.size(), 1u);
 
-    ServiceTesting::ServiceProcess restarted(settings);
-    for (const auto& entry : std::filesystem::directory_iterator(settings.storeDirectory)) {
+    ServiceTesting::ServiceProcess restarted(scene.settings());
+    for (const auto& entry : std::filesystem::directory_iterator(scene.settings().storeDirectory)) {
         EXPECT_NE(entry.path().filename().string().rfind(".__temp__", 0), 0u)
             << "leftover " << entry.path();
     }
     for (const auto& ack : acknowledged) {
         const ServiceTesting::RawAnswer got = ServiceTesting::rawPost(
             restarted.port(),
-            "<Retrieve><Host>crash</Host><ConfigurationName>" + docName(ack.first, ack.second) +
+            "<Retrieve><Host>crash</Host><ConfigurationName>" + docName(ack.writer, ack.index) +
                 "</ConfigurationName></Retrieve>",
             cookie);
-        ASSERT_EQ(elementText(got.body, "Configuration"), base64(payload(ack.first, ack.second)))
-            << docName(ack.first, ack.second);
+        ASSERT_EQ(elementText(got.body, "Configuration"), base64(payload(ack.writer, ack.index)))
+            << docName(ack.writer, ack.index);
     }
     // At most one store per writer was in flight; nothing else may appear.
     const std::string listing =
         ServiceTesting::rawPost(restarted.port(), "<ListItems><Host>*</Host></ListItems>", cookie)
             .body;
-    std::size_t items = 0;
-    for (std::size_t at = 0; (at = listing.find("<ConfigurationItem>", at)) != std::string::npos;
-         ++at) {
-        ++items;
-    }
+    const std::size_t items = ServiceTesting::occurrences(listing, "<ConfigurationItem>");
     EXPECT_GE(items, acknowledged.size());
     EXPECT_LE(items, acknowledged.size() + kWriters);
     EXPECT_EQ(listing.find(".__temp__"), std::string::npos);
 }
 
 TEST(CrashSafety, SigtermStopsTheServiceCleanly) {
-    Quorvex::Testing::ScratchDir scratch;
-    const ServiceTesting::TicketFile ticket(scratch.path(), "stop-ticket");
-    ServiceTesting::ServiceProcess::Settings settings;
-    settings.storeDirectory = scratch.file("store");
-    settings.eventDirectory = scratch.file("events");
-    ServiceTesting::ServiceProcess service(settings);
+    const ServiceTesting::CrashScene scene("stop-ticket", "");
+    ServiceTesting::ServiceProcess service(scene.settings());
     ServiceTesting::rawPost(service.port(), "<GetHostName></GetHostName>", "");
     const int status = service.stop(SIGTERM);
     ASSERT_TRUE(WIFEXITED(status)) << status;
     EXPECT_EQ(WEXITSTATUS(status), 0);
     // The lock went with the process: the directory can be opened again at once.
-    ServiceTesting::ServiceProcess again(settings);
+    ServiceTesting::ServiceProcess again(scene.settings());
 }
 
 }  // namespace
