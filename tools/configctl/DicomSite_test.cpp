@@ -10,6 +10,7 @@
 #include <sstream>
 #include <string>
 
+#include "ExampleSite.h"
 #include "InProcessService.h"
 #include "ToolRun.h"
 
@@ -18,18 +19,6 @@ namespace {
 
 using Testing::configctl;
 using Testing::ToolRun;
-
-const char* const kSiteDocuments[] = {
-    "DicomScp",
-    "Qrscp",
-    "StorageCommit",
-    "KelExport",
-    "KelExportLocal",
-    "KelExportRemoteConfigurations",
-    "KelExportWebServiceLocal",
-    "AutoExport",
-    "KelQuery",
-};
 
 std::string siteFile(const std::string& name) {
     std::ifstream in(std::string(QUORVEX_EXAMPLES) + "/site/" + name + ".xml", std::ios::binary);
@@ -93,7 +82,7 @@ protected:
     }
     std::map<std::string, std::string> goodSite() const {
         std::map<std::string, std::string> documents;
-        for (const char* name : kSiteDocuments) {
+        for (const char* name : Testing::kDicomSiteDocuments) {
             documents[name] = siteFile(name);
         }
         return documents;

@@ -5,9 +5,9 @@
 #include <fstream>
 #include <string>
 
+#include "ExampleSite.h"
 #include "InProcessService.h"
 #include "ToolRun.h"
-#include "workflow/WorkflowStore.h"
 
 namespace Configctl {
 namespace {
@@ -15,22 +15,6 @@ namespace {
 using Testing::configctl;
 using Testing::shell;
 using Testing::ToolRun;
-
-// Documents of the example site, stored under "BrimmetServer\<name>" (the processes table on
-// Store1).
-const char* const kSiteDocuments[] = {"DicomScp",
-                                      "Qrscp",
-                                      "StorageCommit",
-                                      "KelExport",
-                                      "KelExportLocal",
-                                      "KelExportRemoteConfigurations",
-                                      "KelExportWebServiceLocal",
-                                      "AutoExport",
-                                      "KelQuery",
-                                      "StrategyConfiguration",
-                                      "Location",
-                                      "MsmqCommon",
-                                      "KelArchive"};
 
 // One command and a Python expression over its parsed output d (and its raw text raw) that
 // must be true.
@@ -99,7 +83,10 @@ class JsonOutput : public ::testing::Test {
 protected:
     JsonOutput() {
         const std::string site = std::string(QUORVEX_EXAMPLES) + "/site/";
-        for (const char* name : kSiteDocuments) {
+        for (const char* name : Testing::kDicomSiteDocuments) {
+            put(std::string("'BrimmetServer\\") + name + "' " + site + name + ".xml");
+        }
+        for (const char* name : Testing::kStorageSiteDocuments) {
             put(std::string("'BrimmetServer\\") + name + "' " + site + name + ".xml");
         }
         put("--host Store1 'BrimmetServer\\ProcessesAndServices' " + site +
@@ -107,30 +94,11 @@ protected:
         put("'BrimmetServer\\SOPServiceConfiguration' " + std::string(QUORVEX_EXAMPLES) +
             "/dicom/SOPServiceConfiguration.xml");
         EXPECT_EQ(configctl(server + " register QuorvexStorageServer").status, 0);
-        addUsers();
+        Testing::addSampleUsers(service.server().workflow());
     }
     void put(const std::string& arguments) {
         const ToolRun run = configctl(server + " put " + arguments);
         EXPECT_EQ(run.status, 0) << arguments << ": " << run.out;
-    }
-    // alice (logged in, on call) with Cases (shared: the folder Hard and two items) in her
-    // master folder; bob logged out.
-    void addUsers() {
-        auto& workflow = service.server().workflow();
-        workflow.login({{"UserId", "alice"},
-                        {"UserName", "Doe^Alice \"Ali\""},
-                        {"Type", "Radiologist"},
-                        {"OnCall", "true"}});
-        workflow.login({{"UserId", "bob"}, {"Type", "Technologist"}});
-        workflow.logout("bob");
-        const std::string master = workflow.user("alice").masterFolderId;
-        const auto cases = workflow.createNode(
-            {{"UserId", "alice"}, {"ParentId", master}, {"Name", "Cases"}, {"Shared", "true"}});
-        workflow.createNode({{"UserId", "alice"}, {"ParentId", cases.id}, {"Name", "Hard"}});
-        for (const char* name : {"1", "2"}) {
-            workflow.createNode(
-                {{"UserId", "alice"}, {"ParentId", cases.id}, {"Name", name}, {"Type", "1"}});
-        }
     }
     // Whether python3 parses text as JSON with check true of it.
     ToolRun parse(const std::string& text, const std::string& check) {

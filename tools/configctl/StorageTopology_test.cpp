@@ -6,6 +6,7 @@
 #include <cstdio>
 #include <string>
 
+#include "ExampleSite.h"
 #include "InProcessService.h"
 #include "ToolRun.h"
 
@@ -18,7 +19,7 @@ using ToolOutput = Testing::ToolRun;
 class StorageCommands : public ::testing::Test {
 protected:
     StorageCommands() {
-        for (const char* name : {"StrategyConfiguration", "Location", "MsmqCommon", "KelArchive"}) {
+        for (const char* name : Testing::kStorageSiteDocuments) {
             const std::string file = std::string(QUORVEX_EXAMPLES) + "/site/" + name + ".xml";
             EXPECT_EQ(configctl(server + " put 'BrimmetServer\\" + name + "' " + file).status, 0);
         }

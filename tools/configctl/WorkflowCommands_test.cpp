@@ -5,14 +5,12 @@
 
 #include <cstdio>
 
+#include "ExampleSite.h"
 #include "InProcessService.h"
 #include "ToolRun.h"
-#include "workflow/WorkflowStore.h"
 
 namespace Configctl {
 namespace {
-
-using ConfigurationService::Workflow::Fields;
 
 // What configctl prints for arguments.
 std::string configctl(const std::string& arguments) {
@@ -21,30 +19,16 @@ std::string configctl(const std::string& arguments) {
 
 TEST(ConfigctlWorkflow, ListsUsersAndPrintsAFolderTree) {
     ServiceTesting::InProcessService service;
-    auto& workflow = service.server().workflow();
-    workflow.login({{"UserId", "alice"},
-                    {"UserName", "Doe^Alice"},
-                    {"Type", "Radiologist"},
-                    {"OnCall", "true"}});
-    workflow.login({{"UserId", "bob"}, {"Type", "Technologist"}});
-    workflow.logout("bob");
-    const std::string master = workflow.user("alice").masterFolderId;
-    const auto cases = workflow.createNode(
-        {{"UserId", "alice"}, {"ParentId", master}, {"Name", "Cases"}, {"Shared", "true"}});
-    workflow.createNode({{"UserId", "alice"}, {"ParentId", cases.id}, {"Name", "Hard"}});
-    for (const char* name : {"1", "2"}) {
-        workflow.createNode(
-            {{"UserId", "alice"}, {"ParentId", cases.id}, {"Name", name}, {"Type", "1"}});
-    }
+    const Testing::SampleFolders folders = Testing::addSampleUsers(service.server().workflow());
     const std::string server = "--server " + service.address();
     EXPECT_EQ(
-        "alice\tRadiologist\tlogged in\ton call\tDoe^Alice\n"
+        "alice\tRadiologist\tlogged in\ton call\tDoe^Alice \"Ali\"\n"
         "bob\tTechnologist\tlogged out\t-\t\n",
         configctl(server + " users"));
     EXPECT_EQ("bob\tTechnologist\tlogged out\t-\t\n", configctl(server + " users Technologist"));
     const std::string tree = configctl(server + " folders alice");
-    EXPECT_NE(std::string::npos, tree.find("Master folder " + master + "\n  Cases [" + cases.id +
-                                           "] shared, 2 items\n    Hard ["))
+    EXPECT_NE(std::string::npos, tree.find("Master folder " + folders.master + "\n  Cases [" +
+                                           folders.cases + "] shared, 2 items\n    Hard ["))
         << tree;
     EXPECT_NE(std::string::npos, tree.find("], 0 items\n    (2 items)\n")) << tree;
     EXPECT_EQ(0u, configctl(server + " folders nobody").rfind("configctl: ", 0));
