@@ -4,6 +4,7 @@
 
 #include <chrono>
 #include <cstdlib>
+#include <mutex>
 #include <string>
 
 #include "Quorvex/Log.h"
@@ -18,6 +19,48 @@ void initialiseCurl() {
     static const CURLcode result = curl_global_init(CURL_GLOBAL_DEFAULT);
     (void)result;
 }
+
+// The process-wide cache of open connections (with resolved names and TLS sessions) that every
+// easy handle uses: each post still has a handle of its own, but a connection to the same server
+// left open by an earlier post is taken up again instead of opening a new one. A pooled
+// connection that the server has closed meanwhile is noticed by libcurl, which then opens a new
+// one. Created on first use and kept until the process ends (cleaning it up at exit could race
+// with posts on other threads).
+class ConnectionShare {
+public:
+    static CURLSH* get() {
+        static ConnectionShare* const share = new ConnectionShare();
+        return share->m_share;
+    }
+
+private:
+    ConnectionShare() : m_share(curl_share_init()) {
+        if (m_share == nullptr) {
+            return;
+        }
+        curl_share_setopt(m_share, CURLSHOPT_LOCKFUNC, &ConnectionShare::lock);
+        curl_share_setopt(m_share, CURLSHOPT_UNLOCKFUNC, &ConnectionShare::unlock);
+        curl_share_setopt(m_share, CURLSHOPT_USERDATA, this);
+        curl_share_setopt(m_share, CURLSHOPT_SHARE, CURL_LOCK_DATA_CONNECT);
+        curl_share_setopt(m_share, CURLSHOPT_SHARE, CURL_LOCK_DATA_DNS);
+        curl_share_setopt(m_share, CURLSHOPT_SHARE, CURL_LOCK_DATA_SSL_SESSION);
+    }
+
+    // libcurl's lock callbacks: one mutex per kind of shared data.
+    static void lock(CURL*, curl_lock_data data, curl_lock_access, void* self) {
+        static_cast<ConnectionShare*>(self)->mutexFor(data).lock();
+    }
+    static void unlock(CURL*, curl_lock_data data, void* self) {
+        static_cast<ConnectionShare*>(self)->mutexFor(data).unlock();
+    }
+    std::mutex& mutexFor(curl_lock_data data) {
+        const int index = static_cast<int>(data);
+        return m_mutexes[index >= 0 && index < CURL_LOCK_DATA_LAST ? index : 0];
+    }
+
+    CURLSH* m_share;
+    std::mutex m_mutexes[CURL_LOCK_DATA_LAST];
+};
 
 class EasyHandle {
 public:
@@ -126,16 +169,17 @@ private:
     bool m_expired = false;
 };
 
-// A fresh connection for every post, and timeoutMs as the longest silence: first while
-// connecting (TLS handshake included), then between any two bytes of the exchange. A time-out of
-// 0 or less waits without limit.
+// Connections come from the process-wide share (kept open between posts), and timeoutMs is the
+// longest silence: first while connecting (TLS handshake included), then between any two bytes of
+// the exchange. A time-out of 0 or less waits without limit.
 void setConnectionPolicy(CURL* curl, long timeoutMs, StallWatch& watch) {
     curl_easy_setopt(curl, CURLOPT_NOSIGNAL, 1L);
     curl_easy_setopt(curl, CURLOPT_PROXY, "");  // never through a proxy from the environment
     curl_easy_setopt(curl, CURLOPT_PROTOCOLS_STR, "http,https");
     curl_easy_setopt(curl, CURLOPT_HTTP_VERSION, static_cast<long>(CURL_HTTP_VERSION_1_1));
-    curl_easy_setopt(curl, CURLOPT_FRESH_CONNECT, 1L);
-    curl_easy_setopt(curl, CURLOPT_FORBID_REUSE, 1L);
+    if (CURLSH* share = ConnectionShare::get()) {
+        curl_easy_setopt(curl, CURLOPT_SHARE, share);
+    }
     if (timeoutMs <= 0) {
         return;
     }
