@@ -3,8 +3,11 @@
 #include <gtest/gtest.h>
 #include <sys/stat.h>
 
+#include <fcntl.h>
+
 #include <cstdio>
 #include <cstdlib>
+#include <ctime>
 #include <fstream>
 
 #include "Client/ServiceTicketModule.h"
@@ -33,6 +36,11 @@ public:
         std::ofstream(m_path, std::ios::binary | std::ios::trunc) << content;
         chmod(m_path.c_str(), mode);
     }
+    // Sets the file's modification time (whole seconds).
+    void setModified(time_t when) {
+        const timespec times[2] = {{0, UTIME_OMIT}, {when, 0}};
+        ASSERT_EQ(0, utimensat(AT_FDCWD, m_path.c_str(), times, 0));
+    }
 
 private:
     Quorvex::Testing::ScratchDir m_folder;
@@ -56,6 +64,37 @@ TEST(ServiceTicketModule, AMissingFileGivesNoTicket) {
     ACE_CString ticket;
     EXPECT_EQ(ServerInteropAPI::TICKET_FILE_MISSING, fetch(ticket));
     EXPECT_TRUE(ticket.empty());
+}
+
+// A ticket file that has settled is read once and then only looked at (stat): a rewrite that
+// keeps its inode, size, time and mode is not seen; any change of those is.
+TEST(ServiceTicketModule, ASettledFileIsReadOnceUntilItChanges) {
+    TicketFile file;
+    const time_t anHourAgo = std::time(nullptr) - 3600;
+    const std::pair<const char*, const char*> steps[] = {
+        {"Tk-first-0001", "Tk-first-0001"},   // read and kept
+        {"Tk-other-0002", "Tk-first-0001"},   // same inode, size, time: the kept ticket
+        {nullptr, "Tk-other-0002"},           // only the time moved: read again
+        {"Tk-third-0003!", "Tk-third-0003!"}  // new content and size
+    };
+    for (const auto& step : steps) {
+        if (step.first != nullptr) {
+            file.write(step.first);
+            file.setModified(anHourAgo);
+        } else {
+            file.setModified(anHourAgo + 1800);
+        }
+        ACE_CString ticket;
+        ASSERT_EQ(0, fetch(ticket));
+        EXPECT_STREQ(step.second, ticket.c_str());
+    }
+    file.write("Tk-fresh-0004");  // just written: read on every call while it may still change
+    for (const char* content : {"Tk-fresh-0004", "Tk-fresh-0005"}) {
+        file.write(content);
+        ACE_CString ticket;
+        ASSERT_EQ(0, fetch(ticket));
+        EXPECT_STREQ(content, ticket.c_str());
+    }
 }
 
 TEST(ServiceTicketModule, RefusesAFileOthersCanRead) {
@@ -148,6 +187,7 @@ TEST_F(ServiceTicketClient, TheTicketNeverReachesTheLog) {
     Quorvex::Testing::LogCapture capture;
     const HttpConfigurationClient client = makeTicketClient();
     server().enqueue(ScriptedResponse::Close());
+    server().enqueue(ScriptedResponse::Close());  // a pooled connection dropped is tried again
     EXPECT_ANY_THROW(client.signalRefresh());
     server().enqueue(
         ScriptedResponse::Ok(Testing::LegacyFailure("<ErrorMessage>x</ErrorMessage>")));

@@ -6,7 +6,10 @@
 //
 // The ticket is the content of a file readable only by its owner: /etc/quorvex/service-ticket, or
 // the file named by the environment variable QUORVEX_SERVICE_TICKET_FILE (see
-// docs/SERVICE_TICKET.md). The ticket is never logged. Thread-safe: every call reads the file anew.
+// docs/SERVICE_TICKET.md). The ticket is never logged. Thread-safe. A ticket read from a file that
+// had not changed for a few seconds is kept in memory, and later calls only check (by stat) that
+// the file is still that version: same inode, size, modification time, mode and owner; any
+// change makes the next call read the file again.
 #pragma once
 
 #include <ace/SString.h>
