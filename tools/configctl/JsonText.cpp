@@ -57,11 +57,15 @@ JsonWriter& JsonWriter::close(char bracket) {
     return *this;
 }
 
-JsonWriter& JsonWriter::beginObject() {
+JsonWriter& JsonWriter::open(char bracket) {
     separate();
-    m_out << '{';
+    m_out << bracket;
     m_empty.push_back(true);
     return *this;
+}
+
+JsonWriter& JsonWriter::beginObject() {
+    return open('{');
 }
 
 JsonWriter& JsonWriter::endObject() {
@@ -69,10 +73,7 @@ JsonWriter& JsonWriter::endObject() {
 }
 
 JsonWriter& JsonWriter::beginArray() {
-    separate();
-    m_out << '[';
-    m_empty.push_back(true);
-    return *this;
+    return open('[');
 }
 
 JsonWriter& JsonWriter::endArray() {

@@ -62,6 +62,7 @@ public:
 private:
     JsonWriter& raw(const std::string& token);
     void separate();
+    JsonWriter& open(char bracket);
     JsonWriter& close(char bracket);
 
     std::ostream& m_out;
