@@ -1,13 +1,16 @@
-// Deflates into a growing buffer as bytes arrive, so memory holds only the compressed form.
+// Deflates into a buffer as bytes arrive, so memory holds only the compressed form. Before each
+// write the buffer is made large enough for zlib's bound on what that input can become, so a
+// document written in one piece is compressed into one allocation, grown once if at all; the
+// buffer is not zero-filled, so pages that the compressed bytes never reach are never touched.
 #include "Quorvex/OutputZMemStream.h"
 
 #include <zlib.h>
 
 #include <algorithm>
 #include <climits>
+#include <cstdlib>
 #include <new>
 #include <stdexcept>
-#include <vector>
 
 #include "Quorvex/StreamException.h"
 
@@ -18,23 +21,53 @@ constexpr std::size_t kMinCapacity = 64;
 }  // namespace
 
 struct OutputZMemStream::State {
+    struct Free {
+        void operator()(unsigned char* block) const { std::free(block); }
+    };
+
     z_stream zs{};
-    std::vector<unsigned char> buffer;
+    std::unique_ptr<unsigned char, Free> buffer;
+    std::size_t capacity = 0;
     std::size_t used = 0;
     bool finished = false;
 
+    // Makes the buffer hold at least size bytes (contents kept).
+    void grow(std::size_t size);
+    // Room for all that len more bytes of input can compress to, including the stream's end.
+    void reserveFor(std::size_t len);
     // Runs deflate over [data, data + len) with the given flush mode until zlib is done with it.
     void deflateAll(const unsigned char* data, std::size_t len, int flushMode);
     // Makes room for more output and points zlib at it.
     void provideOutput();
 };
 
-void OutputZMemStream::State::provideOutput() {
-    if (used == buffer.size()) {
-        buffer.resize(std::max(buffer.size() * 2, kMinCapacity));
+void OutputZMemStream::State::grow(std::size_t size) {
+    if (size <= capacity) {
+        return;
     }
-    zs.next_out = buffer.data() + used;
-    zs.avail_out = static_cast<uInt>(std::min<std::size_t>(buffer.size() - used, UINT_MAX));
+    void* block = std::realloc(buffer.get(), size);
+    if (block == nullptr) {
+        throw std::bad_alloc();
+    }
+    buffer.release();
+    buffer.reset(static_cast<unsigned char*>(block));
+    capacity = size;
+}
+
+void OutputZMemStream::State::reserveFor(std::size_t len) {
+    const uLong bound =
+        deflateBound(&zs, static_cast<uLong>(std::min<std::size_t>(len, ULONG_MAX)));
+    if (capacity - used < bound) {
+        grow(used + bound);
+    }
+}
+
+void OutputZMemStream::State::provideOutput() {
+    if (used == capacity) {  // the bound was passed (pending output of earlier writes)
+        grow(std::max(capacity * 2, kMinCapacity));
+    }
+    zs.next_out = buffer.get() + used;
+    zs.avail_out = static_cast<uInt>(std::min<std::size_t>(capacity - used, UINT_MAX));
 }
 
 void OutputZMemStream::State::deflateAll(const unsigned char* data, std::size_t len,
@@ -67,7 +100,7 @@ OutputZMemStream::OutputZMemStream(std::size_t initialCapacity, int level) : m_s
         throw std::invalid_argument("OutputZMemStream: compression level " + std::to_string(level) +
                                     " is not in -1..9");
     }
-    m_state->buffer.resize(std::max(initialCapacity, kMinCapacity));
+    m_state->grow(std::max(initialCapacity, kMinCapacity));
     const int rc = deflateInit(&m_state->zs, level);
     if (rc == Z_MEM_ERROR) {
         throw std::bad_alloc();
@@ -86,6 +119,7 @@ void OutputZMemStream::write(const void* data, std::size_t len) {
         throw Quorvex::StreamException("OutputZMemStream: write after flush");
     }
     if (len > 0) {
+        m_state->reserveFor(len);
         m_state->deflateAll(static_cast<const unsigned char*>(data), len, Z_NO_FLUSH);
     }
 }
@@ -99,7 +133,7 @@ void OutputZMemStream::flush() {
 }
 
 const unsigned char* OutputZMemStream::data() const {
-    return m_state->buffer.data();
+    return m_state->buffer.get();
 }
 
 std::size_t OutputZMemStream::size() const {
