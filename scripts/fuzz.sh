@@ -13,7 +13,7 @@ targets=("$@")
 [ ${#targets[@]} -gt 0 ] || targets=(xml_reader_fuzz stored_form_decode_fuzz base64_decode_fuzz
                                    date_parse_fuzz zstream_decode_fuzz class_read_fuzz
                                    transfer_syntax_list_fuzz sop_document_fuzz dicom_document_fuzz
-                                   storage_topology_fuzz)
+                                   storage_topology_fuzz xml_direct_reader_fuzz)
 build=${QUORVEX_FUZZ_BUILD:-$root/build-fuzz}
 "$root/scripts/install-deps.sh"
 CC=clang CXX=clang++ BUILD_TARGETS="${targets[*]}" "$root/scripts/build.sh" "$build" \
@@ -32,6 +32,9 @@ for t in "${targets[@]}"; do
   # The DICOM service documents start from the example site and the classes' samples.
   [ "$t" = dicom_document_fuzz ] && seeds=("$root/examples/site" "$root/tests/data/classes")
   [ "$t" = storage_topology_fuzz ] && seeds=("$root/examples/site" "$root/tests/data/classes")
+  # The one-pass reader starts from printed trees: the element-tree seeds and the samples.
+  [ "$t" = xml_direct_reader_fuzz ] &&
+    seeds=("$root/fuzz/seeds/xml_reader_fuzz" "$root/tests/data/classes" "$root/examples/site")
   "$build/fuzz/$t" -max_total_time="$seconds" -max_len=65536 -rss_limit_mb=2048 \
     -artifact_prefix="$crashes/" -print_final_stats=1 "$corpus" "${seeds[@]}" 2>&1 | tail -n 12
 done

@@ -23,6 +23,9 @@ public:
     // The tree held by doc. TrelException for a DOCTYPE, for anything the writer would not have
     // written, and for nesting deeper than XmlUtils::kMaxDepth.
     static Element read(const pugi::xml_document& doc);
+    // Parses text with pugixml (using text as its working buffer) and reads the tree; the same
+    // TrelExceptions, plus malformed XML and NUL bytes.
+    static Element parse(std::string& text);
 
 private:
     // The key of an e node, after checking its nesting depth and attributes; a view valid until

@@ -1,8 +1,5 @@
 #include "Vesk/XmlUtils.h"
 
-#include <pugixml.hpp>
-
-#include <cstring>
 #include <string>
 #include <utility>
 
@@ -15,14 +12,6 @@ namespace Vesk {
 namespace XmlUtils {
 
 namespace {
-
-// Whitespace-only texts are kept (a value may be all blanks) and the first text of a node is held
-// in the node itself, which saves a node per value. Fragment mode makes pugixml keep text outside
-// the root element, so that the reader can refuse it instead of pugixml dropping it; a DOCTYPE
-// becomes a node so that the reader can refuse it. pugixml never expands entities of its own.
-constexpr unsigned int kParseOptions = pugi::parse_default | pugi::parse_ws_pcdata |
-                                       pugi::parse_embed_pcdata | pugi::parse_doctype |
-                                       pugi::parse_fragment;
 
 void checkSize(std::size_t len) {
     if (len > kMaxTextBytes) {
@@ -51,19 +40,7 @@ void parseInPlace(std::string& text, Element& out, const ACE_CString& name) {
             return;
         }
     }
-    if (std::memchr(text.data(), '\0', text.size()) != nullptr) {
-        throw TrelException("Vesk::XmlUtils: the XML text holds a NUL byte");
-    }
-    pugi::xml_document doc;
-    // The terminating NUL goes in too: pugixml overwrites the last byte of its buffer with its
-    // own terminator, which would otherwise cut the last byte of a stray trailing text.
-    const pugi::xml_parse_result result =
-        doc.load_buffer_inplace(&text[0], text.size() + 1, kParseOptions);
-    if (!result) {
-        throw TrelException("Vesk::XmlUtils: malformed XML at byte " +
-                            std::to_string(result.offset) + ": " + result.description());
-    }
-    Element tree = XmlTreeReader::read(doc);
+    Element tree = XmlTreeReader::parse(text);
     checkRootName(tree, name);
     out = std::move(tree);
 }
