@@ -177,12 +177,18 @@ Reply ItemOperations::lastModifiedTime(const Request& request) {
 
 Reply ItemOperations::listItems(const Request& request) {
     const ACE_CString host(request.required("Host").c_str());
-    // Sized in a first pass and written in a second, reading the stored items in place.
-    std::size_t size = 0;
-    m_context.store.visit(host, [&size](const StoredItem& item) { size += listedSize(item); });
     Answer answer = Answer::success("ListItems");
-    answer.reserve(size);
-    m_context.store.visit(host, [&answer](const StoredItem& item) { appendListed(answer, item); });
+    // Read in place: sized in a first pass over the items, written in a second.
+    m_context.store.read(host, [&answer](const std::vector<const StoredItem*>& items) {
+        std::size_t size = 0;
+        for (const StoredItem* item : items) {
+            size += listedSize(*item);
+        }
+        answer.reserve(size);
+        for (const StoredItem* item : items) {
+            appendListed(answer, *item);
+        }
+    });
     return Reply{200, answer.finish()};
 }
 

@@ -189,19 +189,18 @@ bool DirectoryStore::remove(const ACE_CString& host, const ACE_CString& name) {
 
 template <typename Visit>
 std::size_t DirectoryStore::visitLocked(const ACE_CString& host, const Visit& visit) const {
-    std::size_t count = 0;
-    if (host == kAllHosts) {
-        for (const auto& entry : m_items) {
-            visit(entry.second.item);
-            ++count;
-        }
-        return count;
+    auto begin = m_items.begin();
+    auto end = m_items.end();
+    if (host != kAllHosts) {
+        // Keys are the lower-case host, NUL, the name: the host's items lie between its key
+        // followed by NUL and its key followed by the next byte.
+        const std::string hostKey = Quorvex::HostKey(toStd(host));
+        begin = m_items.lower_bound(hostKey + std::string(1, '\0'));
+        end = m_items.lower_bound(hostKey + std::string(1, '\1'));
     }
-    const std::string prefix = Quorvex::HostKey(toStd(host)) + std::string(1, '\0');
-    for (auto it = m_items.lower_bound(prefix);
-         it != m_items.end() && it->first.compare(0, prefix.size(), prefix) == 0; ++it) {
+    std::size_t count = 0;
+    for (auto it = begin; it != end; ++it, ++count) {
         visit(it->second.item);
-        ++count;
     }
     return count;
 }
@@ -215,10 +214,15 @@ std::vector<StoredItem> DirectoryStore::list(const ACE_CString& host) const {
     return items;
 }
 
-std::size_t DirectoryStore::visit(const ACE_CString& host,
-                                  const std::function<void(const StoredItem&)>& visit) const {
+void DirectoryStore::read(
+    const ACE_CString& host,
+    const std::function<void(const std::vector<const StoredItem*>&)>& read) const {
+    // One walk over the tree, whose nodes are scattered in memory; growing a vector of pointers
+    // costs less than a second walk to count them.
+    std::vector<const StoredItem*> items;
     std::shared_lock<std::shared_mutex> lock(m_itemsMutex);
-    return visitLocked(host, visit);
+    visitLocked(host, [&items](const StoredItem& item) { items.push_back(&item); });
+    read(items);
 }
 
 std::size_t DirectoryStore::size() const {

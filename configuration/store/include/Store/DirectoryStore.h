@@ -66,10 +66,10 @@ public:
     bool remove(const ACE_CString& host, const ACE_CString& name);
     // The items of host (kAllHosts: of every host), ordered by host and name.
     std::vector<StoredItem> list(const ACE_CString& host) const;
-    // Calls visit on each item of host in list() order without copying them, under the read
-    // lock: visit must be quick and must not call into the store. Returns how many it visited.
-    std::size_t visit(const ACE_CString& host,
-                      const std::function<void(const StoredItem&)>& visit) const;
+    // Calls read once with the items of host in list() order, without copying them, under the
+    // read lock: read must be quick and must not call into the store.
+    void read(const ACE_CString& host,
+              const std::function<void(const std::vector<const StoredItem*>&)>& read) const;
     // How many items are stored.
     std::size_t size() const;
 
