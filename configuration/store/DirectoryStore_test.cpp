@@ -68,11 +68,22 @@ TEST_F(DirectoryStoreTest, ListsOneHostOrAllHostsWithExactNames) {
     put(store, "a", "X\\One", "1");
     put(store, "a", "X\\Two", "2");
     put(store, "b", "X\\One", "3");
+    // Hosts whose keys sort right next to "a"'s items.
+    for (const char* neighbour : {"ab", "a\x01", "a-", "`"}) {
+        put(store, neighbour, "X\\One", "4");
+    }
     const std::vector<StoredItem> ofA = store.list("A");
     ASSERT_EQ(ofA.size(), 2u);
     EXPECT_EQ(ofA[0].name, "X\\One");
     EXPECT_EQ(ofA[1].name, "X\\Two");
-    EXPECT_EQ(store.list(DirectoryStore::kAllHosts).size(), 3u);
+    std::vector<std::string> read;
+    store.read("A", [&read](const std::vector<const StoredItem*>& items) {
+        for (const StoredItem* item : items) {
+            read.push_back(item->name.c_str());
+        }
+    });
+    EXPECT_EQ(read, (std::vector<std::string>{"X\\One", "X\\Two"}));
+    EXPECT_EQ(store.list(DirectoryStore::kAllHosts).size(), 7u);
     EXPECT_TRUE(store.list("c").empty());
 }
 
