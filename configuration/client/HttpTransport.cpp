@@ -91,8 +91,25 @@ private:
     curl_slist* m_list = nullptr;
 };
 
+// Where the answer's body goes: the first piece reserves room for the whole body when the answer
+// announced its length, so that a large body is not copied again at every piece.
+struct BodySink {
+    CURL* curl;
+    ACE_CString& body;
+};
+
+constexpr curl_off_t kMaxReservedBody = 256 << 20;
+
 std::size_t collectBody(char* data, std::size_t size, std::size_t count, void* target) {
-    static_cast<ACE_CString*>(target)->append(data, size * count);
+    BodySink& sink = *static_cast<BodySink*>(target);
+    if (sink.body.length() == 0) {
+        curl_off_t announced = -1;
+        curl_easy_getinfo(sink.curl, CURLINFO_CONTENT_LENGTH_DOWNLOAD_T, &announced);
+        if (announced > 0 && announced <= kMaxReservedBody) {
+            sink.body.fast_resize(static_cast<std::size_t>(announced));  // room, length 0
+        }
+    }
+    sink.body.append(data, size * count);
     return size * count;
 }
 
@@ -228,8 +245,9 @@ HttpTransport::Outcome HttpTransport::post(const ACE_CString& server, const ACE_
     }
 
     answer.body.clear();
+    BodySink sink{curl, answer.body};
     curl_easy_setopt(curl, CURLOPT_WRITEFUNCTION, &collectBody);
-    curl_easy_setopt(curl, CURLOPT_WRITEDATA, &answer.body);
+    curl_easy_setopt(curl, CURLOPT_WRITEDATA, &sink);
     char error[CURL_ERROR_SIZE] = "";
     curl_easy_setopt(curl, CURLOPT_ERRORBUFFER, error);
 

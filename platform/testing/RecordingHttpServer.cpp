@@ -26,9 +26,10 @@ int portOf(const sockaddr_storage& address) {
     return ntohs(reinterpret_cast<const sockaddr_in&>(address).sin_port);
 }
 
-// Ends the connection of request without an answer (plain or TLS): the peer sees it closed. The
-// HTTP library does not hand out its sockets, so the connection is found by its two ports.
-void dropConnection(const httplib::Request& request) {
+// Shuts down (both ways) the connected sockets of this process whose local and peer ports match
+// (a peer port of -1 matches any); the peer sees them closed. The HTTP library does not hand out
+// its sockets, so they are found by their ports. Returns after the first match when onlyOne.
+void shutdownConnections(int localPort, int peerPort, bool onlyOne) {
     DIR* folder = opendir("/proc/self/fd");
     while (dirent* entry = folder != nullptr ? readdir(folder) : nullptr) {
         const int fd = std::atoi(entry->d_name);
@@ -38,14 +39,21 @@ void dropConnection(const httplib::Request& request) {
         socklen_t peerLength = sizeof peer;
         if (fd > 2 && getsockname(fd, reinterpret_cast<sockaddr*>(&local), &localLength) == 0 &&
             getpeername(fd, reinterpret_cast<sockaddr*>(&peer), &peerLength) == 0 &&
-            portOf(local) == request.local_port && portOf(peer) == request.remote_port) {
+            portOf(local) == localPort && (peerPort < 0 || portOf(peer) == peerPort)) {
             shutdown(fd, SHUT_RDWR);
-            break;
+            if (onlyOne) {
+                break;
+            }
         }
     }
     if (folder != nullptr) {
         closedir(folder);
     }
+}
+
+// Ends the connection of request without an answer (plain or TLS).
+void dropConnection(const httplib::Request& request) {
+    shutdownConnections(request.local_port, request.remote_port, true);
 }
 
 // Waits (bounded) until the server's thread is listening.
@@ -96,6 +104,9 @@ RecordingHttpServer::RecordingHttpServer(const TlsIdentity& identity)
 RecordingHttpServer::~RecordingHttpServer() {
     waitUntilRunning(*m_server);  // stopping a server not yet listening would not stop it
     m_server->stop();
+    // Clients keep their connections open between requests; the server's workers would wait on
+    // them for the whole keep-alive time before the server could end.
+    shutdownConnections(m_port, -1, false);
     m_thread.join();
 }
 
@@ -115,6 +126,9 @@ void RecordingHttpServer::start() {
         response.set_content(answer.body, "text/xml");
     };
     m_server->Get(".*", handler).Post(".*", handler).Put(".*", handler).Delete(".*", handler);
+    // Answers go out at once on kept-alive connections: without TCP_NODELAY the body, written
+    // after the head, would wait for the client's delayed acknowledgement (about 40 ms).
+    m_server->set_tcp_nodelay(true);
     m_port = m_server->bind_to_any_port("127.0.0.1");
     if (m_port <= 0) {
         throw std::runtime_error("RecordingHttpServer: cannot bind 127.0.0.1");
