@@ -13,7 +13,8 @@ targets=("$@")
 [ ${#targets[@]} -gt 0 ] || targets=(xml_reader_fuzz stored_form_decode_fuzz base64_decode_fuzz
                                    date_parse_fuzz zstream_decode_fuzz class_read_fuzz
                                    transfer_syntax_list_fuzz sop_document_fuzz dicom_document_fuzz
-                                   storage_topology_fuzz xml_direct_reader_fuzz)
+                                   storage_topology_fuzz xml_direct_reader_fuzz
+                                   service_request_fuzz)
 build=${QUORVEX_FUZZ_BUILD:-$root/build-fuzz}
 "$root/scripts/install-deps.sh"
 CC=clang CXX=clang++ BUILD_TARGETS="${targets[*]}" "$root/scripts/build.sh" "$build" \

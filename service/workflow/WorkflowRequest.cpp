@@ -46,7 +46,7 @@ Fields fieldsOf(const pugi::xml_node& record) {
     Fields fields;
     for (pugi::xml_node child = record.first_child(); child; child = child.next_sibling()) {
         if (child.type() == pugi::node_element) {
-            fields.emplace(child.name(), textOf(child));
+            fields.emplace(asUtf8(child.name()), textOf(child));
         }
     }
     return fields;
@@ -118,7 +118,7 @@ WorkflowRequest WorkflowRequest::parse(const std::string& body) {
         throw WorkflowError::bad("the message names no operation");
     }
     WorkflowRequest request;
-    request.operation = operation.name();
+    request.operation = asUtf8(operation.name());
     for (pugi::xml_node child = operation.first_child(); child; child = child.next_sibling()) {
         if (child.type() != pugi::node_element) {
             continue;
@@ -127,7 +127,7 @@ WorkflowRequest WorkflowRequest::parse(const std::string& body) {
         if (record) {
             request.record = fieldsOf(record);
         } else {
-            request.parameters.emplace(child.name(), textOf(child));
+            request.parameters.emplace(asUtf8(child.name()), textOf(child));
         }
     }
     return request;

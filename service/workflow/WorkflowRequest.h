@@ -1,9 +1,9 @@
 // WorkflowRequest: one parsed request of the user-workflow service:
 // <Message><Operation><param>text</param>...<node xmlns="..."><Node><Field>text</Field>...</Node>
 // </node></Operation></Message>. Parameters and record fields are kept by name (an element the
-// client left out is absent). Text that is not valid UTF-8 is taken as Latin-1 (the clients'
-// local code page) and stored as UTF-8, so that every text the service keeps is UTF-8. A plain
-// value.
+// client left out is absent). A name or text that is not valid UTF-8 is taken as Latin-1 (the
+// clients' local code page) and kept as UTF-8, so that every text the service stores or echoes in
+// an answer is UTF-8. A plain value.
 #pragma once
 
 #include <string>

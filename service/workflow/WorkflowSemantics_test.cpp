@@ -236,6 +236,11 @@ TEST_F(WorkflowSemantics, MalformedMessagesAreRefusedClearly) {
         {"<Other><Logout/></Other>", "is a &lt;Message&gt; element"},
         {"<Message></Message>", "names no operation"},
         {"<Message><Explode/></Message>", "unknown operation \"Explode\""},
+        // An operation named in Latin-1 is echoed as UTF-8, never as raw bytes.
+        {"<Message><Expl\xf6"
+         "de/></Message>",
+         "unknown operation \"Expl\xc3\xb6"
+         "de\""},
         {"<Message><ListUsers><loggedInOnly>maybe</loggedInOnly></ListUsers></Message>",
          "loggedInOnly is true or false"},
         {"<Message><GetFolderData><folderId>x</folderId><modifiedSince>soon</modifiedSince>"
