@@ -8,6 +8,7 @@
 #include <ace/Log_Msg.h>
 #include <benchmark/benchmark.h>
 
+#include <cstdint>
 #include <memory>
 #include <string>
 
@@ -113,7 +114,21 @@ void BM_BareTimestampAndRetrieve(benchmark::State& state) {
     }
 }
 
+// A loop of private work of about a cached read's length on each thread, sharing nothing: how
+// much parallelism the machine gives this run, to read the cached rows by (2 threads vs 1 can
+// reach 2 only when two cores are free).
+void BM_BareThreadScaling(benchmark::State& state) {
+    std::uint64_t value = static_cast<std::uint64_t>(state.thread_index()) + 1;
+    for (auto _ : state) {
+        for (int i = 0; i < 40; ++i) {
+            value = value * 6364136223846793005u + 1442695040888963407u;
+        }
+        benchmark::DoNotOptimize(value);
+    }
+}
+
 BENCHMARK(BM_CachedGetLatest)->Threads(1)->Threads(2)->UseRealTime();
+BENCHMARK(BM_BareThreadScaling)->Threads(1)->Threads(2)->UseRealTime();
 BENCHMARK(BM_ColdGetLatest)->Iterations(kColdDocuments)->Unit(benchmark::kMicrosecond);
 BENCHMARK(BM_BareClientRetrieve)->Iterations(2000)->Unit(benchmark::kMicrosecond);
 BENCHMARK(BM_BareTimestampAndRetrieve)->Iterations(2000)->Unit(benchmark::kMicrosecond);

@@ -28,6 +28,7 @@ lib_row "stored-form encode, level 9" stored_form_bench BM_EncodeStoredForm BM_E
 lib_row "cold GetLatest" repository_bench BM_ColdGetLatest BM_BareClientRetrieve time 1.4
 lib_row "cold GetLatest vs its two requests bare" repository_bench BM_ColdGetLatest BM_BareTimestampAndRetrieve time 1.4
 lib_row "cached GetLatest, 2 threads vs 1" repository_bench BM_CachedGetLatest/threads:2 BM_CachedGetLatest/threads:1 rate 1.6
+lib_row "machine: private loop, 2 threads vs 1" repository_bench BM_BareThreadScaling/threads:2 BM_BareThreadScaling/threads:1 rate 1.6
 lib_row "cached GetLatest, 1 thread (ns)" repository_bench BM_CachedGetLatest/threads:1 - ns 100
 lib_row "client Retrieve 64 KiB" http_client_bench ClientRetrieve/65536 BareCurlRetrieve/65536 rate 0.95
 
