@@ -31,6 +31,7 @@ lib_row "cached GetLatest, 2 threads vs 1" repository_bench BM_CachedGetLatest/t
 lib_row "machine: private loop, 2 threads vs 1" repository_bench BM_BareThreadScaling/threads:2 BM_BareThreadScaling/threads:1 rate 1.6
 lib_row "cached GetLatest, 1 thread (ns)" repository_bench BM_CachedGetLatest/threads:1 - ns 100
 lib_row "client Retrieve 64 KiB" http_client_bench ClientRetrieve/65536 BareCurlRetrieve/65536 rate 0.95
+lib_row "client Retrieve 64 KiB vs bare libcurl + Base64 decode" http_client_bench ClientRetrieve/65536 BareCurlRetrieveAndDecode/65536 rate 0.95
 
 ROOT="$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)"
 BUILD_DIR="${BUILD_DIR:-$ROOT/build-bench}"
