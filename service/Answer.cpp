@@ -62,12 +62,6 @@ void Answer::reserve(std::size_t more) {
     m_text.reserve(m_text.size() + more + m_root.size() + 3);
 }
 
-Answer& Answer::trusted(const std::string& tag, const char* text, std::size_t length) {
-    open(tag);
-    m_text.append(text, length);
-    return close(tag);
-}
-
 Answer& Answer::open(const std::string& tag) {
     m_text += '<';
     m_text += tag;
@@ -84,6 +78,17 @@ Answer& Answer::close(const std::string& tag) {
 
 std::string Answer::finish() {
     close(m_root);
+    return std::move(m_text);
+}
+
+std::string Answer::finishAround(const std::string& tag, std::string& tail) {
+    open(tag);
+    tail.reserve(tag.size() + m_root.size() + 5);
+    tail += "</";
+    tail += tag;
+    tail += "></";
+    tail += m_root;
+    tail += '>';
     return std::move(m_text);
 }
 

@@ -19,8 +19,6 @@ public:
     // Appends <tag>escaped text</tag>.
     Answer& element(const std::string& tag, const std::string& text);
     Answer& element(const std::string& tag, const char* text, std::size_t length);
-    // Appends <tag>text</tag> for text known to need no escaping (Base64, digits).
-    Answer& trusted(const std::string& tag, const char* text, std::size_t length);
     // Appends <tag>Base64 of the bytes</tag>, encoded in place; with reserve() beforehand the
     // answer is built in one buffer of its final size.
     Answer& base64(const std::string& tag, const void* data, std::size_t length);
@@ -32,6 +30,9 @@ public:
     Answer& close(const std::string& tag);
     // Closes the root and returns the text.
     std::string finish();
+    // Opens tag and returns the text so far; tail receives the closing tags of tag and of the
+    // root. For an answer whose last element's text is sent from a copy kept elsewhere.
+    std::string finishAround(const std::string& tag, std::string& tail);
 
     // A legacy success carrying what was appended, as <root><ReturnStatus>1</ReturnStatus>...
     static Answer success(const std::string& operation);

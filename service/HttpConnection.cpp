@@ -257,8 +257,8 @@ void HttpConnection::runRequest() {
 
 void HttpConnection::answer(Reply reply) {
     m_grant.release();
-    m_large = m_large || reply.body.size() >= kLargeBytes;
-    send(reply.status, std::move(reply.body), !m_keepAlive);
+    m_large = m_large || reply.size() >= kLargeBytes;
+    send(std::move(reply), !m_keepAlive);
 }
 
 // Answers a request refused from its head or body; close when unread bytes would follow.
@@ -266,19 +266,22 @@ void HttpConnection::refuse(int status, const std::string& message, bool close) 
     QUORVEX_LOG(LM_DEBUG, "HttpConnection: refused a request from %s: %d %s\n", m_peer.c_str(),
                 status, message.c_str());
     m_grant.release();
-    send(status, Answer::failure("", message), close || !m_keepAlive);
+    send(Reply{status, Answer::failure("", message)}, close || !m_keepAlive);
 }
 
-void HttpConnection::send(int status, std::string body, bool close) {
+void HttpConnection::send(Reply reply, bool close) {
+    const int status = reply.status;
     m_response = Response(static_cast<http::status>(status), m_version);
     m_response.set(http::field::content_type, "text/xml");
     if (status == 405) {
         m_response.set(http::field::allow, "POST");
     }
     m_response.keep_alive(!close);
-    m_response.body() = std::move(body);
+    m_response.body().head = std::move(reply.body);
+    m_response.body().shared = std::move(reply.shared);
+    m_response.body().tail = std::move(reply.tail);
     m_response.prepare_payload();
-    m_stream.expires_after(timeFor(m_front.limits, m_response.body().size()));
+    m_stream.expires_after(timeFor(m_front.limits, AnswerBody::size(m_response.body())));
     http::async_write(m_stream, m_response,
                       [self = shared_from_this(), close](ErrorCode error, std::size_t) {
                           self->onSent(error, close);

@@ -18,6 +18,7 @@
 #include <memory>
 #include <string>
 
+#include "AnswerBody.h"
 #include "FrontContext.h"
 #include "Operations.h"
 
@@ -40,7 +41,7 @@ public:
 
 private:
     using Parser = boost::beast::http::request_parser<boost::beast::http::string_body>;
-    using Response = boost::beast::http::response<boost::beast::http::string_body>;
+    using Response = boost::beast::http::response<AnswerBody>;
     using ErrorCode = boost::beast::error_code;
 
     void awaitRequest();
@@ -54,7 +55,7 @@ private:
     void runRequest();
     void answer(Reply reply);
     void refuse(int status, const std::string& message, bool close);
-    void send(int status, std::string body, bool close);
+    void send(Reply reply, bool close);
     void onSent(ErrorCode error, bool close);
     void closeGracefully();
     void drain();

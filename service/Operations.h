@@ -6,17 +6,32 @@
 
 #include <functional>
 #include <map>
+#include <memory>
 #include <string>
+#include <utility>
 
 #include "OperationFailed.h"
 #include "Request.h"
 
 namespace ConfigurationService {
 
-// One answer: HTTP status and body.
+// One answer: HTTP status and body. A large body may end in a shared text that never changes
+// (kept once for every answer that carries it) and a tail: the answer's text is then body,
+// *shared and tail in that order, sent without joining them.
 struct Reply {
+    Reply() = default;
+    // An answer of one text.
+    Reply(int status, std::string body) : status(status), body(std::move(body)) {}
+
     int status = 200;
     std::string body;
+    std::shared_ptr<const std::string> shared;
+    std::string tail;
+
+    // The length of the answer's text.
+    std::size_t size() const { return body.size() + (shared ? shared->size() : 0) + tail.size(); }
+    // The answer's text, joined.
+    std::string text() const { return shared ? body + *shared + tail : body + tail; }
 };
 
 class Operations {

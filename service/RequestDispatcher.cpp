@@ -57,7 +57,7 @@ Reply RequestDispatcher::dispatch(std::string& body, const std::vector<std::stri
     }
     QUORVEX_LOG(LM_DEBUG, "RequestDispatcher: %s from %s: %d, %d bytes\n",
                 describe(request).c_str(), peer.c_str(), reply.status,
-                static_cast<int>(reply.body.size()));
+                static_cast<int>(reply.size()));
     return reply;
 }
 

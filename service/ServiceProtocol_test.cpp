@@ -6,6 +6,7 @@
 #include "ConfigurationServer.h"
 #include "InProcessService.h"
 #include "Quorvex/BDateTime.h"
+#include "Quorvex/Base64Coder.h"
 #include "RawConnection.h"
 #include "RawPost.h"
 
@@ -62,6 +63,31 @@ TEST(ServiceProtocol, RetrieveItemsReportsMissingDocumentsByStatusAndKey) {
     EXPECT_EQ(elementText(some.body, "ErrorKey"), "AF901DEB-1F70-41cf-879D-6EFC19168686");
     EXPECT_NE(some.body.find("absent"), std::string::npos) << some.body;
     EXPECT_EQ(post(service, itemBody("RetrieveItems", "h", ";,;")).status, 400);
+}
+
+// Large documents are answered from their kept Base64 text in pieces: every retrieve, on one
+// connection and on several, carries the whole text and the closing tags.
+TEST(ServiceProtocol, LargeDocumentsComeBackWholeOnEveryRetrieve) {
+    InProcessService service;
+    for (std::size_t size : {16383u, 16384u, 300000u}) {
+        std::string bytes(size, '\0');
+        for (std::size_t i = 0; i < size; ++i) {
+            bytes[i] = static_cast<char>(i * 7 + i / 300);
+        }
+        const std::string base64 =
+            Base64Coder::Encode(reinterpret_cast<const unsigned char*>(bytes.data()), size).c_str();
+        const std::string name = "Doc" + std::to_string(size);
+        post(service, storeBody("h", name, base64));
+        ServiceTesting::RawConnection connection(service.port());
+        for (int i = 0; i < 3; ++i) {
+            const RawAnswer answer = post(service, itemBody("Retrieve", "h", name));
+            EXPECT_EQ(elementText(answer.body, "Configuration"), base64) << size << " " << i;
+            ASSERT_TRUE(connection.send(ServiceTesting::RawConnection::post(
+                itemBody("Retrieve", "h", name), InProcessService::ticketCookie())));
+            const ServiceTesting::HttpAnswer kept = connection.readAnswer(std::chrono::seconds(5));
+            EXPECT_EQ(kept.body, answer.body) << size << " " << i;
+        }
+    }
 }
 
 // Guards against a front that closes a kept-alive connection after a few requests.
