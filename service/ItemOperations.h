@@ -35,7 +35,7 @@ private:
     std::int64_t storeHere(const Request& request, const std::string& bytes, std::int64_t time);
 
     // Documents from this size on keep their Base64 text between retrieves, up to the budget.
-    static constexpr std::size_t kCachedBase64From = 16 * 1024;
+    static constexpr std::size_t kCachedBase64From = 1024;
     static constexpr std::size_t kCachedBase64Budget = 64u << 20;
 
     ServiceContext& m_context;
