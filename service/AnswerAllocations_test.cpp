@@ -141,7 +141,7 @@ std::string coderBase64(const std::string& bytes) {
 // texts are kept; a document stored again is answered with its new text, never a kept one.
 TEST_F(AnswerAllocations, RetrieveAnswersTheSameBase64AsTheCoderAtEverySize) {
     for (std::size_t size :
-         {0u, 1u, 2u, 3u, 4u, 3071u, 3072u, 3073u, 6146u, 16383u, 16384u, 100000u}) {
+         {0u, 1u, 2u, 3u, 4u, 1023u, 1024u, 3071u, 3072u, 3073u, 6146u, 100000u}) {
         const std::string name = "Doc" + std::to_string(size);
         for (int version = 0; version < 2; ++version) {
             std::string bytes = bytesOf(size);
