@@ -1,15 +1,16 @@
-// HttpTransport: the one HTTP exchange of HttpConfigurationClient, over libcurl. Every post uses a
-// fresh easy handle; the connections themselves live in one process-wide cache shared by all
-// handles, so a post to a server that an earlier post left a connection open to takes that
-// connection up again instead of opening a new one (one TCP connection per server and thread at a
-// time, not one per request). A pooled connection that the server has closed meanwhile (a
-// restart, an idle time-out) is replaced by a new one without the caller noticing: when such a
-// connection turns out dead before any byte of the answer arrived, libcurl sends the request once
-// more over a new connection. A post is routed by HttpRoute to the client's server, sends the
-// cookies in key order in one Cookie header and an explicit Content-Length. The time-out bounds
-// silence, not the whole exchange: connecting may take at most that long, and afterwards the
-// exchange is ended only when no byte went up or came down for longer than that (checked about once
-// a second), so a large body on a slow link is not cut while it still moves.
+// HttpTransport: the one HTTP exchange of HttpConfigurationClient, over libcurl. Every post starts
+// from its thread's easy handle reset to its defaults (nothing carries over from the last post);
+// the connections themselves live in one process-wide cache shared by all handles, so a post to a
+// server that an earlier post left a connection open to takes that connection up again instead of
+// opening a new one (one TCP connection per server and thread at a time, not one per request). A
+// pooled connection that the server has closed meanwhile (a restart, an idle time-out) is replaced
+// by a new one without the caller noticing: when such a connection turns out dead before any byte
+// of the answer arrived, libcurl sends the request once more over a new connection. A post is
+// routed by HttpRoute to the client's server, sends the cookies in key order in one Cookie header
+// and an explicit Content-Length. The time-out bounds silence, not the whole exchange: connecting
+// may take at most that long, and afterwards the exchange is ended only when no byte went up or
+// came down for longer than that (checked about once a second), so a large body on a slow link is
+// not cut while it still moves.
 //
 // TLS peers are verified against the system's certificate store, or against the PEM bundle named
 // by the environment variable QUORVEX_CA_FILE when it is set (for private certificate
