@@ -251,7 +251,7 @@ bool XmlDirectReader::entity(std::string& out) {
 bool XmlDirectReader::base64(std::string_view encoded, std::string_view& out) {
     std::size_t len = 0;
     m_decoded = Base64Coder::Decode(encoded.data(), encoded.size(), len);
-    out = len == 0 ? std::string_view()
+    out = len == 0 ? std::string_view("", 0)  // never a null pointer, even when empty
                    : std::string_view(reinterpret_cast<const char*>(m_decoded.get()), len);
     return true;
 }

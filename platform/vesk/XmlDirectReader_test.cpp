@@ -81,6 +81,7 @@ TEST(XmlDirectReader, ReadsWhatItTakesAsTheGeneralReaderDoes) {
         "<e k=\"a&#9;b\"></e>",
         "<e k64=\"QUI=\"><s64>AAE=</s64></e>",
         "<e k64=\"Q!I=\"></e>",
+        "<e k64=\"\"><a n64=\"\" v=\"\"/><s64></s64></e>",
         "<e k=\"R\"><a n=\"x\" v=\"y\"/><a n64=\"eA==\" v64=\"\"/><l>\n <e k=\"c\"/></l></e>",
         "<e k=\"R\"><a n=\"x\" v=\"y\"/><l> <e k=\"c\"></e>\n\t</l></e>",
         "<e k=\"R\"><s>x</s><a n=\"x\" v=\"y\"/></e>",

@@ -283,7 +283,7 @@ std::string_view XmlTreeReader::decodeText(const char* utf8, bool base64) {
     } catch (const std::invalid_argument&) {
         refuse("a string marked as Base64 is not valid Base64");
     }
-    return len == 0 ? std::string_view()
+    return len == 0 ? std::string_view("", 0)  // never a null pointer, even when empty
                     : std::string_view(reinterpret_cast<const char*>(m_decoded.get()), len);
 }
 
