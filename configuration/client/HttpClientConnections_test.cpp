@@ -1,7 +1,10 @@
 // Connections: every client is fresh, but the TCP connection to a server is taken up again by the
 // next request, whichever client sends it; a connection the server dropped is replaced without
-// the caller noticing; a server that stops answering on a pooled connection is still given up on.
+// the caller noticing; a forked child never uses its parent's connections; a server that stops
+// answering on a pooled connection is still given up on.
 #include <gtest/gtest.h>
+#include <sys/wait.h>
+#include <unistd.h>
 
 #include <chrono>
 #include <string>
@@ -42,6 +45,32 @@ TEST(HttpClientConnections, AConnectionTheServerDroppedIsReplacedUnnoticed) {
     KeepAliveTestServer server(kAnswer, KeepAliveTestServer::Mode::CloseAfterAnswer);
     retrieveThroughFreshClients(server.authority(), 10);
     EXPECT_EQ(12, server.accepted());
+}
+
+// A forked child talking over its parent's pooled socket would mix the two processes' exchanges on
+// one connection; the child opens its own, and the parent's stays usable.
+TEST(HttpClientConnections, AForkedChildOpensAConnectionOfItsOwn) {
+    KeepAliveTestServer server(kAnswer, KeepAliveTestServer::Mode::KeepOpen);
+    retrieveThroughFreshClients(server.authority(), 1);
+    const pid_t child = fork();
+    if (child == 0) {
+        try {
+            const HttpConfigurationClient client(server.authority().c_str(), false, false);
+            Quorvex::ByteArray data;
+            std::size_t length = 0;
+            client.retrieve("keep-host", "Doc", data, length);
+            _exit(length == 4 ? 0 : 3);
+        } catch (...) {
+            _exit(2);
+        }
+    }
+    ASSERT_GT(child, 0);
+    int status = 0;
+    ASSERT_EQ(child, waitpid(child, &status, 0));
+    EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0) << status;
+    EXPECT_EQ(2, server.accepted());
+    retrieveThroughFreshClients(server.authority(), 1);
+    EXPECT_EQ(2, server.accepted());
 }
 
 TEST(HttpClientConnections, ASilentServerOnAPooledConnectionIsStillGivenUpOn) {

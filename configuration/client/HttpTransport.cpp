@@ -1,7 +1,9 @@
 #include "client/HttpTransport.h"
 
 #include <curl/curl.h>
+#include <pthread.h>
 
+#include <atomic>
 #include <chrono>
 #include <cstdlib>
 #include <mutex>
@@ -20,21 +22,48 @@ void initialiseCurl() {
     (void)result;
 }
 
+// Counts the forks this process came out of. A forked child must never use its parent's pooled
+// connections (the parent still talks over the same sockets) nor the parent's handles and locks,
+// so on the first post after a fork the child makes its own and leaves the parent's untouched.
+std::atomic<unsigned> g_forkGeneration{0};
+
+void countFork() {
+    g_forkGeneration.fetch_add(1, std::memory_order_relaxed);
+}
+
+unsigned forkGeneration() {
+    static const int registered = pthread_atfork(nullptr, nullptr, &countFork);
+    (void)registered;
+    return g_forkGeneration.load(std::memory_order_relaxed);
+}
+
 // The process-wide cache of open connections (with resolved names and TLS sessions) that every
-// easy handle uses: each post still has a handle of its own, but a connection to the same server
-// left open by an earlier post is taken up again instead of opening a new one. A pooled
+// easy handle uses: each post still starts from a clean handle, but a connection to the same
+// server left open by an earlier post is taken up again instead of opening a new one. A pooled
 // connection that the server has closed meanwhile is noticed by libcurl, which then opens a new
-// one. Created on first use and kept until the process ends (cleaning it up at exit could race
-// with posts on other threads).
+// one. Created on first use (and again in a forked child) and kept until the process ends
+// (cleaning it up at exit could race with posts on other threads).
 class ConnectionShare {
 public:
     static CURLSH* get() {
-        static ConnectionShare* const share = new ConnectionShare();
+        static std::atomic<ConnectionShare*> current{nullptr};
+        static std::mutex creating;
+        const unsigned generation = forkGeneration();
+        ConnectionShare* share = current.load(std::memory_order_acquire);
+        if (share == nullptr || share->m_generation != generation) {
+            const std::lock_guard<std::mutex> guard(creating);
+            share = current.load(std::memory_order_acquire);
+            if (share == nullptr || share->m_generation != generation) {
+                share = new ConnectionShare(generation);  // a parent's share is left as it is
+                current.store(share, std::memory_order_release);
+            }
+        }
         return share->m_share;
     }
 
 private:
-    ConnectionShare() : m_share(curl_share_init()) {
+    explicit ConnectionShare(unsigned generation)
+        : m_share(curl_share_init()), m_generation(generation) {
         if (m_share == nullptr) {
             return;
         }
@@ -59,35 +88,46 @@ private:
     }
 
     CURLSH* m_share;
+    const unsigned m_generation;
     std::mutex m_mutexes[CURL_LOCK_DATA_LAST];
 };
 
-class EasyHandle {
+// The easy handle of one thread, cleaned up when the thread ends; one made before a fork is
+// left alone in the child (it belongs to the parent's connections and locks).
+class ThreadHandle {
 public:
-    EasyHandle() : m_handle(curl_easy_init()) {}
-    ~EasyHandle() {
-        if (m_handle != nullptr) {
+    ThreadHandle() = default;
+    ~ThreadHandle() {
+        if (m_handle != nullptr && m_generation == forkGeneration()) {
             curl_easy_cleanup(m_handle);
         }
     }
-    EasyHandle(const EasyHandle&) = delete;
-    EasyHandle& operator=(const EasyHandle&) = delete;
-    CURL* get() const { return m_handle; }
+    ThreadHandle(const ThreadHandle&) = delete;
+    ThreadHandle& operator=(const ThreadHandle&) = delete;
+
+    // The handle with every option back at its default; null when libcurl has none to give.
+    CURL* fresh() {
+        const unsigned generation = forkGeneration();
+        if (m_handle != nullptr && m_generation == generation) {
+            curl_easy_reset(m_handle);
+            return m_handle;
+        }
+        m_handle = curl_easy_init();
+        m_generation = generation;
+        return m_handle;
+    }
 
 private:
-    CURL* m_handle;
+    CURL* m_handle = nullptr;
+    unsigned m_generation = 0;
 };
 
-// The easy handle of the calling thread, with every option back at its default. A handle made
-// afresh for each post would also build and tear down libcurl's internal multi handle (a socket
-// pair and its set-up) every time; one per thread, reset, costs nothing of that. Cleaned up when
-// the thread ends.
+// The easy handle of the calling thread, reset. A handle made afresh for each post would also
+// build and tear down libcurl's internal multi handle (a socket pair and its set-up) every time;
+// one per thread, reset, costs nothing of that.
 CURL* threadHandle() {
-    thread_local EasyHandle handle;
-    if (handle.get() != nullptr) {
-        curl_easy_reset(handle.get());
-    }
-    return handle.get();
+    thread_local ThreadHandle handle;
+    return handle.fresh();
 }
 
 class HeaderList {
