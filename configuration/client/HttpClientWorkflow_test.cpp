@@ -259,9 +259,6 @@ TEST_F(HttpClientWorkflow, ServiceErrorsBecomeTheirExceptionClasses) {
     };
     for (const auto& c : cases) {
         server().enqueue(c.first);
-        if (c.first.closeWithoutAnswer) {  // a pooled connection dropped is tried once more
-            server().enqueue(c.first);
-        }
         EXPECT_EQ(c.second, failureOf([](auto& cl) { cl.UwfLogoutUser("u"); }, client).first);
     }
 }

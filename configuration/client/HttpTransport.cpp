@@ -6,7 +6,6 @@
 #include <atomic>
 #include <chrono>
 #include <cstdlib>
-#include <mutex>
 #include <string>
 
 #include "Quorvex/Log.h"
@@ -22,9 +21,9 @@ void initialiseCurl() {
     (void)result;
 }
 
-// Counts the forks this process came out of. A forked child must never use its parent's pooled
-// connections (the parent still talks over the same sockets) nor the parent's handles and locks,
-// so on the first post after a fork the child makes its own and leaves the parent's untouched.
+// Counts the forks this process came out of. A forked child must not use its parent's easy handle
+// (its internal state belongs to the parent), so on the first post after a fork the child makes
+// its own and leaves the parent's untouched.
 std::atomic<unsigned> g_forkGeneration{0};
 
 void countFork() {
@@ -37,63 +36,8 @@ unsigned forkGeneration() {
     return g_forkGeneration.load(std::memory_order_relaxed);
 }
 
-// The process-wide cache of open connections (with resolved names and TLS sessions) that every
-// easy handle uses: each post still starts from a clean handle, but a connection to the same
-// server left open by an earlier post is taken up again instead of opening a new one. A pooled
-// connection that the server has closed meanwhile is noticed by libcurl, which then opens a new
-// one. Created on first use (and again in a forked child) and kept until the process ends
-// (cleaning it up at exit could race with posts on other threads).
-class ConnectionShare {
-public:
-    static CURLSH* get() {
-        static std::atomic<ConnectionShare*> current{nullptr};
-        static std::mutex creating;
-        const unsigned generation = forkGeneration();
-        ConnectionShare* share = current.load(std::memory_order_acquire);
-        if (share == nullptr || share->m_generation != generation) {
-            const std::lock_guard<std::mutex> guard(creating);
-            share = current.load(std::memory_order_acquire);
-            if (share == nullptr || share->m_generation != generation) {
-                share = new ConnectionShare(generation);  // a parent's share is left as it is
-                current.store(share, std::memory_order_release);
-            }
-        }
-        return share->m_share;
-    }
-
-private:
-    explicit ConnectionShare(unsigned generation)
-        : m_share(curl_share_init()), m_generation(generation) {
-        if (m_share == nullptr) {
-            return;
-        }
-        curl_share_setopt(m_share, CURLSHOPT_LOCKFUNC, &ConnectionShare::lock);
-        curl_share_setopt(m_share, CURLSHOPT_UNLOCKFUNC, &ConnectionShare::unlock);
-        curl_share_setopt(m_share, CURLSHOPT_USERDATA, this);
-        curl_share_setopt(m_share, CURLSHOPT_SHARE, CURL_LOCK_DATA_CONNECT);
-        curl_share_setopt(m_share, CURLSHOPT_SHARE, CURL_LOCK_DATA_DNS);
-        curl_share_setopt(m_share, CURLSHOPT_SHARE, CURL_LOCK_DATA_SSL_SESSION);
-    }
-
-    // libcurl's lock callbacks: one mutex per kind of shared data.
-    static void lock(CURL*, curl_lock_data data, curl_lock_access, void* self) {
-        static_cast<ConnectionShare*>(self)->mutexFor(data).lock();
-    }
-    static void unlock(CURL*, curl_lock_data data, void* self) {
-        static_cast<ConnectionShare*>(self)->mutexFor(data).unlock();
-    }
-    std::mutex& mutexFor(curl_lock_data data) {
-        const int index = static_cast<int>(data);
-        return m_mutexes[index >= 0 && index < CURL_LOCK_DATA_LAST ? index : 0];
-    }
-
-    CURLSH* m_share;
-    const unsigned m_generation;
-    std::mutex m_mutexes[CURL_LOCK_DATA_LAST];
-};
-
 // The easy handle of one thread, cleaned up when the thread ends; one made before a fork is
-// left alone in the child (it belongs to the parent's connections and locks).
+// left alone in the child (it belongs to the parent).
 class ThreadHandle {
 public:
     ThreadHandle() = default;
@@ -238,17 +182,17 @@ private:
     bool m_expired = false;
 };
 
-// Connections come from the process-wide share (kept open between posts), and timeoutMs is the
-// longest silence: first while connecting (TLS handshake included), then between any two bytes of
-// the exchange. A time-out of 0 or less waits without limit.
+// Every post opens its own connection and closes it after the answer (no connection is kept or
+// taken up again, so a request is never sent twice), and timeoutMs is the longest silence: first
+// while connecting (TLS handshake included), then between any two bytes of the exchange. A time-out
+// of 0 or less waits without limit.
 void setConnectionPolicy(CURL* curl, long timeoutMs, StallWatch& watch) {
     curl_easy_setopt(curl, CURLOPT_NOSIGNAL, 1L);
     curl_easy_setopt(curl, CURLOPT_PROXY, "");  // never through a proxy from the environment
     curl_easy_setopt(curl, CURLOPT_PROTOCOLS_STR, "http,https");
     curl_easy_setopt(curl, CURLOPT_HTTP_VERSION, static_cast<long>(CURL_HTTP_VERSION_1_1));
-    if (CURLSH* share = ConnectionShare::get()) {
-        curl_easy_setopt(curl, CURLOPT_SHARE, share);
-    }
+    curl_easy_setopt(curl, CURLOPT_FRESH_CONNECT, 1L);
+    curl_easy_setopt(curl, CURLOPT_FORBID_REUSE, 1L);
     if (timeoutMs <= 0) {
         return;
     }

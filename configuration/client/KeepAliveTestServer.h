@@ -1,8 +1,8 @@
-// KeepAliveTestServer: a raw HTTP/1.1 server on 127.0.0.1 for tests of connection reuse. It
-// answers every request with the same 200 answer and keeps the connection open (keep-alive), and
-// counts the TCP connections it has accepted. It can instead close every connection right after
-// its answer (as a restarted server drops its idle connections), or stop answering after a
-// number of requests (a hung server). Every wait is bounded (polls of 50 ms until stopped), so
+// KeepAliveTestServer: a raw HTTP/1.1 server on 127.0.0.1 for tests of how clients use their
+// connections. It answers every request with the same 200 answer and keeps the connection open
+// (keep-alive), so that only the client can end it; it counts the TCP connections it accepted and
+// those the client ended. It can stop answering after a number of requests (a hung server). Every
+// wait is bounded (polls of 50 ms until stopped), so
 // it ends by itself when destroyed. Header-only; for the *_test.cpp files.
 #pragma once
 
@@ -23,12 +23,10 @@ namespace Testing {
 
 class KeepAliveTestServer {
 public:
-    enum class Mode { KeepOpen, CloseAfterAnswer };
-
     // answeredRequests: how many requests in all get an answer (the rest are read, never
     // answered); negative for all.
-    KeepAliveTestServer(std::string body, Mode mode, int answeredRequests = -1)
-        : m_body(std::move(body)), m_mode(mode), m_answersLeft(answeredRequests) {
+    explicit KeepAliveTestServer(std::string body, int answeredRequests = -1)
+        : m_body(std::move(body)), m_answersLeft(answeredRequests) {
         m_listener = socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0);
         sockaddr_in address{};
         address.sin_family = AF_INET;
@@ -56,6 +54,8 @@ public:
     int accepted() const { return m_accepted; }
     // Requests read so far (answered or not).
     int requests() const { return m_requests; }
+    // Connections the client closed (the server never closes one while running).
+    int endedByClient() const { return m_endedByClient; }
 
 private:
     // Whether fd becomes readable within one poll interval.
@@ -95,9 +95,6 @@ private:
                 continue;
             }
             answer(fd);
-            if (m_mode == Mode::CloseAfterAnswer) {
-                break;
-            }
         }
         close(fd);
     }
@@ -111,6 +108,7 @@ private:
             char buffer[4096];
             const ssize_t count = read(fd, buffer, sizeof buffer);
             if (count <= 0) {
+                ++m_endedByClient;
                 return false;
             }
             pending.append(buffer, static_cast<std::size_t>(count));
@@ -146,13 +144,13 @@ private:
     }
 
     const std::string m_body;
-    const Mode m_mode;
     std::atomic<int> m_answersLeft;
     int m_listener = -1;
     int m_port = 0;
     std::atomic<bool> m_stop{false};
     std::atomic<int> m_accepted{0};
     std::atomic<int> m_requests{0};
+    std::atomic<int> m_endedByClient{0};
     std::thread m_acceptor;
     std::vector<std::thread> m_connections;  // touched by the acceptor, then by the destructor
 };

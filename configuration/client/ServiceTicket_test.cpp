@@ -187,7 +187,6 @@ TEST_F(ServiceTicketClient, TheTicketNeverReachesTheLog) {
     Quorvex::Testing::LogCapture capture;
     const HttpConfigurationClient client = makeTicketClient();
     server().enqueue(ScriptedResponse::Close());
-    server().enqueue(ScriptedResponse::Close());  // a pooled connection dropped is tried again
     EXPECT_ANY_THROW(client.signalRefresh());
     server().enqueue(
         ScriptedResponse::Ok(Testing::LegacyFailure("<ErrorMessage>x</ErrorMessage>")));
