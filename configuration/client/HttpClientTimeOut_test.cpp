@@ -16,6 +16,7 @@
 #include <thread>
 
 #include "client/HttpTransport.h"
+#include "client/KeepAliveTestServer.h"
 #include "testing/RecordingHttpServer.h"
 
 namespace Configuration {
@@ -39,14 +40,7 @@ public:
         setsockopt(m_listener, SOL_SOCKET, SO_RCVBUF, &receiveBuffer, sizeof receiveBuffer);
         const int segment = 1460;
         setsockopt(m_listener, IPPROTO_TCP, TCP_MAXSEG, &segment, sizeof segment);
-        sockaddr_in address{};
-        address.sin_family = AF_INET;
-        address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
-        socklen_t length = sizeof address;
-        bind(m_listener, reinterpret_cast<sockaddr*>(&address), length);
-        listen(m_listener, 1);
-        getsockname(m_listener, reinterpret_cast<sockaddr*>(&address), &length);
-        m_port = ntohs(address.sin_port);
+        m_port = Testing::listenOnLoopback(m_listener, 1);
         m_thread = std::thread([this] { serveOne(); });
     }
     ~SlowReadingServer() {

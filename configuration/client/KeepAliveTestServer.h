@@ -21,6 +21,18 @@
 namespace Configuration {
 namespace Testing {
 
+// Binds socket to a free port on 127.0.0.1, listens, and returns the port.
+inline int listenOnLoopback(int socket, int backlog) {
+    sockaddr_in address{};
+    address.sin_family = AF_INET;
+    address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+    socklen_t length = sizeof address;
+    bind(socket, reinterpret_cast<sockaddr*>(&address), length);
+    listen(socket, backlog);
+    getsockname(socket, reinterpret_cast<sockaddr*>(&address), &length);
+    return ntohs(address.sin_port);
+}
+
 class KeepAliveTestServer {
 public:
     // answeredRequests: how many requests in all get an answer (the rest are read, never
@@ -28,14 +40,7 @@ public:
     explicit KeepAliveTestServer(std::string body, int answeredRequests = -1)
         : m_body(std::move(body)), m_answersLeft(answeredRequests) {
         m_listener = socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0);
-        sockaddr_in address{};
-        address.sin_family = AF_INET;
-        address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
-        socklen_t length = sizeof address;
-        bind(m_listener, reinterpret_cast<sockaddr*>(&address), length);
-        listen(m_listener, 16);
-        getsockname(m_listener, reinterpret_cast<sockaddr*>(&address), &length);
-        m_port = ntohs(address.sin_port);
+        m_port = listenOnLoopback(m_listener, 16);
         m_acceptor = std::thread([this] { acceptLoop(); });
     }
     ~KeepAliveTestServer() {
