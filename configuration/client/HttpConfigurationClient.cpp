@@ -19,6 +19,7 @@
 #include "Configuration/HttpConfigurationTransportException.h"
 #include "Quorvex/Log.h"
 #include "Quorvex/TextConversion.h"
+#include "client/ElementText.h"
 #include "client/HostNameMap.h"
 #include "client/HttpTransport.h"
 
@@ -143,35 +144,44 @@ void HttpConfigurationClient::checkLegacyResponse(const ACE_CString& body) const
     throw HttpConfigurationException("CheckResponse: request failed.");
 }
 
-bool HttpConfigurationClient::findElementText(const ACE_CString& tag, const ACE_CString& text,
-                                              ACE_CString::size_type start, ACE_CString& value,
-                                              ACE_CString::size_type& next) {
-    const std::string_view view(text.c_str(), text.length());
-    const std::string name(tag.c_str(), tag.length());
-    const std::string open = "<" + name + ">";
-    const std::string close = "</" + name + ">";
-    const auto openAt = view.find(open, start);
+bool locateElementText(std::string_view text, std::string_view tag, std::size_t start,
+                       std::string_view& raw) {
+    const std::string open = "<" + std::string(tag) + ">";
+    const std::string close = "</" + std::string(tag) + ">";
+    const auto openAt = text.find(open, start);
     if (openAt == std::string_view::npos) {
         return false;
     }
     const auto valueStart = openAt + open.size();
-    if (valueStart >= view.size()) {
+    if (valueStart >= text.size()) {
         return false;
     }
-    const auto closeAt = view.find(close, valueStart);
+    const auto closeAt = text.find(close, valueStart);
     if (closeAt == std::string_view::npos) {
         return false;
     }
-    const char* raw = view.data() + valueStart;
-    const auto rawLength = closeAt - valueStart;
-    if (std::memchr(raw, '&', rawLength) == nullptr) {
-        value.set(raw, rawLength, true);  // no entity to replace (e.g. Base64 documents)
-    } else {
-        Quorvex::ConvertXmlStringToString(ACE_CString(raw, rawLength), value);
+    raw = text.substr(valueStart, closeAt - valueStart);
+    return true;
+}
+
+bool HttpConfigurationClient::findElementText(const ACE_CString& tag, const ACE_CString& text,
+                                              ACE_CString::size_type start, ACE_CString& value,
+                                              ACE_CString::size_type& next) {
+    const std::string_view view(text.c_str(), text.length());
+    std::string_view raw;
+    if (!locateElementText(view, std::string_view(tag.c_str(), tag.length()), start, raw)) {
+        return false;
     }
+    if (std::memchr(raw.data(), '&', raw.size()) == nullptr) {
+        value.set(raw.data(), raw.size(), true);  // no entity to replace (e.g. Base64 documents)
+    } else {
+        Quorvex::ConvertXmlStringToString(ACE_CString(raw.data(), raw.size()), value);
+    }
+    const std::size_t valueStart = static_cast<std::size_t>(raw.data() - view.data());
+    const std::size_t closeLength = tag.length() + 3;
     // Counted with the replaced value's length, so it may fall inside the element just read;
     // harmless for the forward search.
-    next = valueStart + value.length() + close.size();
+    next = valueStart + value.length() + closeLength;
     if (next > view.size() - 1) {
         next = view.size() - 1;
     }

@@ -4,6 +4,7 @@
 #include <ace/OS_NS_strings.h>
 
 #include <cstdio>
+#include <cstring>
 #include <stdexcept>
 
 #include "Configuration/HttpConfigurationClient.h"
@@ -14,6 +15,7 @@
 #include "Quorvex/Log.h"
 #include "Quorvex/OutputMemStream.h"
 #include "Vesk/XmlEmitter.h"
+#include "client/ElementText.h"
 
 namespace Configuration {
 
@@ -64,6 +66,20 @@ ACE_CString requiredElement(const char* tag, const ACE_CString& answer, const ch
     return value;
 }
 
+// The document of a retrieve answer: its Base64 text decoded where it stands in the answer (a
+// document's text holds no entity; one that does is read through findElementText like any text).
+Quorvex::ByteArray decodeDocument(const ACE_CString& answer, const char* missing,
+                                  std::size_t& length) {
+    std::string_view raw;
+    if (locateElementText(std::string_view(answer.c_str(), answer.length()),
+                          Client::ELEMENT_CONFIGURATION, 0, raw) &&
+        std::memchr(raw.data(), '&', raw.size()) == nullptr) {
+        return Base64Coder::Decode(raw.data(), raw.size(), length);
+    }
+    return Base64Coder::Decode(requiredElement(Client::ELEMENT_CONFIGURATION, answer, missing),
+                               length);
+}
+
 // A body written by the XML emitter: root holding one escaped text element per parameter, in
 // order; empty values are written too.
 ACE_CString emittedBody(const char* root,
@@ -109,10 +125,9 @@ void HttpConfigurationClient::retrieve(const ACE_CString& host,
                  "HttpConfigurationClient::retrieve: ", [&] {
                      const ACE_CString answer = sendConfiguration(
                          element("Retrieve", hostAndName(host, configurationName)));
-                     const ACE_CString encoded = requiredElement(
-                         ELEMENT_CONFIGURATION, answer, "No configuration found in response");
                      std::size_t decodedLength = 0;
-                     Quorvex::ByteArray decoded = Base64Coder::Decode(encoded, decodedLength);
+                     Quorvex::ByteArray decoded = decodeDocument(
+                         answer, "No configuration found in response", decodedLength);
                      data = std::move(decoded);
                      length = decodedLength;
                  });
