@@ -81,6 +81,11 @@ bool LogCapture::containsFragment(const std::string& fragment) const {
                        [&](const Record& r) { return r.text.find(fragment) != std::string::npos; });
 }
 
+bool LogCapture::onlyStartsWith(const std::string& prefix) const {
+    std::lock_guard<std::mutex> lock(m_mutex);
+    return m_records.size() == 1 && m_records[0].text.rfind(prefix, 0) == 0;
+}
+
 void LogCapture::clear() {
     std::lock_guard<std::mutex> lock(m_mutex);
     m_records.clear();

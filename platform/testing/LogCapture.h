@@ -30,6 +30,8 @@ public:
     bool contains(ACE_Log_Priority priority, const std::string& text) const;
     // Whether any message contains the fragment.
     bool containsFragment(const std::string& fragment) const;
+    // Whether exactly one message was logged, and its text starts with prefix.
+    bool onlyStartsWith(const std::string& prefix) const;
     void clear();
 
     // Called by the backend.

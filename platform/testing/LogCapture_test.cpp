@@ -28,8 +28,12 @@ TEST(LogCaptureTest, RecordsFromEveryThreadMatchedExactly) {
     EXPECT_FALSE(capture.contains(LM_ERROR, "number 42\n"));
     EXPECT_FALSE(capture.contains("number 42"));
     EXPECT_TRUE(capture.containsFragment("Exception: boom"));
+    EXPECT_FALSE(capture.onlyStartsWith("Thing::read"));  // not the only message
     capture.clear();
     EXPECT_TRUE(capture.records().empty());
+    QUORVEX_LOG(LM_ERROR, "Thing::read: Failed.\n");
+    EXPECT_TRUE(capture.onlyStartsWith("Thing::read: "));
+    EXPECT_FALSE(capture.onlyStartsWith("read"));
 }
 
 // Regression: the source location must reach the message (ACE's %N and %l).
