@@ -50,9 +50,9 @@ TEST(KelQuery, AnArchiveLackingAKeyIsDropped) {
     archives.addElement(withoutChild(*archives.begin(), "QueryModel"));
     EXPECT_FALSE(config.readVesk(tree));
     EXPECT_EQ(1u, config.getArchives().size());
-    ASSERT_EQ(1u, log.records().size());  // a missing query model is
-    EXPECT_EQ(0u, log.records()[0].text.rfind(
-                      "KelQueryRemoteSCPConfiguration::readVesk: Failed. Standard Exception: ", 0));
+    // a missing query model is
+    EXPECT_TRUE(log.onlyStartsWith(
+        "KelQueryRemoteSCPConfiguration::readVesk: Failed. Standard Exception: "));
 }
 
 TEST(KelQuery, ThePrefetchSectionIsOptional) {

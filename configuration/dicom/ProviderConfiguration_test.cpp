@@ -135,8 +135,7 @@ TEST(QrscpConfiguration, AFailureEndsTheReadInReadingOrder) {
     EXPECT_EQ(11113, config.getPort());
     EXPECT_FALSE(config.getUseSSL());  // after them
     EXPECT_EQ("", config.getSSLPrivateKey());
-    ASSERT_EQ(1u, log.records().size());
-    EXPECT_EQ(0u, log.records()[0].text.rfind("QrscpConfiguration::readVesk: Failed.", 0));
+    EXPECT_TRUE(log.onlyStartsWith("QrscpConfiguration::readVesk: Failed."));
 }
 
 TEST(QrscpConfiguration, AllowedTitlesKeepOrderAndDuplicates) {

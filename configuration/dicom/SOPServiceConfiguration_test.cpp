@@ -180,9 +180,8 @@ TEST(SOPServiceHostile, ManyServicesAndRandomTextsReadWithinTheirInvariants) {
     Quorvex::Testing::LogCapture log;
     SOPServiceConfiguration config;
     EXPECT_FALSE(config.readVesk(tree));  // "ReleaseDate" and the like are missing
-    ASSERT_EQ(log.records().size(), 1u);  // the text that is no service
-    EXPECT_EQ(log.records()[0].text.rfind("SOPService::readVesk: Failed. Standard Exception: ", 0),
-              0u);
+    // the text that is no service
+    EXPECT_TRUE(log.onlyStartsWith("SOPService::readVesk: Failed. Standard Exception: "));
     const auto& read = config.getSOPServiceList().getSOPServices();
     ASSERT_EQ(read.size(), kServices + 1u);
     const std::set<int> table(std::begin(kNumbers), std::end(kNumbers));
