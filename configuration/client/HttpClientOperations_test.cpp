@@ -40,13 +40,14 @@ void expectPlainError(const std::function<void()>& call, const char* message) {
 class HttpClientOperations : public HttpClientTest {
 protected:
     void answerNext(const std::string& body) { server().enqueue(ScriptedResponse::Ok(body)); }
+
+    const HttpConfigurationClient client = makeClient();  // every test's client
 };
 
 using Call = std::function<void(const HttpConfigurationClient&)>;
 
 // The request bodies are the service's protocol, byte for byte.
 TEST_F(HttpClientOperations, EachOperationSendsItsExactBody) {
-    const HttpConfigurationClient client = makeClient();
     server().setDefault(ScriptedResponse::Ok(
         LegacyOk("<Configuration>YWJj</Configuration><ConfigurationExists>1</ConfigurationExists>"
                  "<LastModifiedTime>2010-03-04T05:06:07</LastModifiedTime>"
@@ -111,7 +112,6 @@ TEST_F(HttpClientOperations, EachOperationSendsItsExactBody) {
 // As written by the service, and wrapped in lines (also with the line ends as character
 // references) as some services and proxies send it.
 TEST_F(HttpClientOperations, RetrieveDecodesTheDocument) {
-    const HttpConfigurationClient client = makeClient();
     for (const char* encoded :
          {"YWJjAP8=", "YWJj\r\nAP8=\r\n", "\n  YWJj\n  AP8=\n", "YWJj&#13;&#10;AP8=&#xD;&#xA;"}) {
         answerNext(LegacyOk(std::string("<Configuration>") + encoded + "</Configuration>"));
@@ -124,13 +124,11 @@ TEST_F(HttpClientOperations, RetrieveDecodesTheDocument) {
 }
 
 TEST_F(HttpClientOperations, RetrieveAllConfigurationsReturnsTheWholeAnswer) {
-    const HttpConfigurationClient client = makeClient();
     answerNext("<Items>anything, unread</Items>");  // judged by status, not ReturnStatus
     EXPECT_EQ("<Items>anything, unread</Items>", str(client.retrieveAllConfigurations("h", "a,b")));
 }
 
 TEST_F(HttpClientOperations, CheckForExistenceAcceptsOnlyOne) {
-    const HttpConfigurationClient client = makeClient();
     bool exists = false;
     answerNext(LegacyOk("<ConfigurationExists>1</ConfigurationExists>"));
     client.checkForExistence("h", "n", exists);
@@ -141,7 +139,6 @@ TEST_F(HttpClientOperations, CheckForExistenceAcceptsOnlyOne) {
 }
 
 TEST_F(HttpClientOperations, GetTimeStampParsesTheServiceTime) {
-    const HttpConfigurationClient client = makeClient();
     answerNext(LegacyOk("<LastModifiedTime>2010-03-04T05:06:07.0890000-00:00</LastModifiedTime>"));
     BDateTime stamp;
     client.getTimeStamp("h", "n", stamp);
@@ -149,7 +146,6 @@ TEST_F(HttpClientOperations, GetTimeStampParsesTheServiceTime) {
 }
 
 TEST_F(HttpClientOperations, GetServerInformationReturnsTheBlobOrReusesTheHostNameText) {
-    const HttpConfigurationClient client = makeClient();
     answerNext(LegacyOk("<ServerInfoBlob>v=1 &amp; more</ServerInfoBlob>"));
     EXPECT_EQ("v=1 & more", str(client.getServerInformation()));
     answerNext(LegacyOk());
@@ -164,7 +160,6 @@ std::string item(const std::string& host, const std::string& name, const std::st
 }
 
 TEST_F(HttpClientOperations, ListItemsReadsEveryItemInOrder) {
-    const HttpConfigurationClient client = makeClient();
     answerNext(LegacyOk(item("h1", "A", "t1") + item("h2", "B&amp;C", "t2")));
     std::vector<_HttpConfigurationItemInfo> items(3);
     client.listItems("h", items);
@@ -181,7 +176,6 @@ TEST_F(HttpClientOperations, ListItemsReadsEveryItemInOrder) {
 
 // An incomplete item ends the list with an error naming its missing field; earlier items stay.
 TEST_F(HttpClientOperations, ListItemsStopsAtAnIncompleteItemNamingTheField) {
-    const HttpConfigurationClient client = makeClient();
     const std::pair<std::string, std::string> cases[] = {
         {"<ConfigurationName>B</ConfigurationName>", "host"},
         {"<HostName>h</HostName>", "configurationName"},
@@ -203,7 +197,6 @@ TEST_F(HttpClientOperations, ListItemsStopsAtAnIncompleteItemNamingTheField) {
 }
 
 TEST_F(HttpClientOperations, ListHostsReplaceTheListKeepingAnswerOrderAndDuplicates) {
-    const HttpConfigurationClient client = makeClient();
     answerNext(LegacyOk("<HostName>b</HostName><HostName>a</HostName><HostName>b</HostName>"));
     std::vector<ACE_CString> hosts(1, "old");
     client.listHosts(hosts);
@@ -214,7 +207,6 @@ TEST_F(HttpClientOperations, ListHostsReplaceTheListKeepingAnswerOrderAndDuplica
 }
 
 TEST_F(HttpClientOperations, RegisterServiceLogsWithoutTheConnectionString) {
-    const HttpConfigurationClient client = makeClient();
     LogCapture capture;
     client.registerService("h1", "Svc<1>", "a&b");
     EXPECT_TRUE(capture.contains(
@@ -280,7 +272,6 @@ void expectWrapped(const Wrapped& operation, const HttpConfigurationClient& clie
 }
 
 TEST_F(HttpClientOperations, DocumentOperationsWrapALegacyErrorMessage) {
-    const HttpConfigurationClient client = makeClient();
     server().setDefault(ScriptedResponse::Ok(LegacyFailure("<ErrorMessage>denied</ErrorMessage>")));
     for (const auto& operation : wrappedOperations()) {
         expectWrapped(operation, client, "denied");
@@ -288,7 +279,6 @@ TEST_F(HttpClientOperations, DocumentOperationsWrapALegacyErrorMessage) {
 }
 
 TEST_F(HttpClientOperations, DocumentOperationsWrapTransportFailures) {
-    const HttpConfigurationClient client = makeClient();
     server().setDefault(ScriptedResponse::Close());
     for (const auto& operation : wrappedOperations()) {
         expectWrapped(operation, client,
@@ -298,7 +288,6 @@ TEST_F(HttpClientOperations, DocumentOperationsWrapTransportFailures) {
 }
 
 TEST_F(HttpClientOperations, RetrieveAllConfigurationsWrapsStatusErrors) {
-    const HttpConfigurationClient client = makeClient();
     server().enqueue(ScriptedResponse::Status(
         500,
         "<ErrorKey>CF919CA8-84FE-4214-9343-C24F6E6B92B2</ErrorKey><ErrorMessage>gone"
@@ -311,7 +300,6 @@ TEST_F(HttpClientOperations, RetrieveAllConfigurationsWrapsStatusErrors) {
 }
 
 TEST_F(HttpClientOperations, MissingAnswerElementsAreWrappedWithTheirTexts) {
-    const HttpConfigurationClient client = makeClient();
     const auto operations = wrappedOperations();
     const std::pair<std::size_t, const char*> cases[] = {
         {2, "HttpConfigurationException: No configuration found in response"},
@@ -323,7 +311,6 @@ TEST_F(HttpClientOperations, MissingAnswerElementsAreWrappedWithTheirTexts) {
 }
 
 TEST_F(HttpClientOperations, RetrieveWrapsBadBase64) {
-    const HttpConfigurationClient client = makeClient();
     answerNext(LegacyOk("<Configuration>@@@</Configuration>"));
     try {
         wrappedOperations()[2].call(client);
@@ -334,7 +321,6 @@ TEST_F(HttpClientOperations, RetrieveWrapsBadBase64) {
 }
 
 TEST_F(HttpClientOperations, OtherOperationsLetTheErrorsThrough) {
-    const HttpConfigurationClient client = makeClient();
     server().setDefault(ScriptedResponse::Ok(LegacyFailure("<ErrorMessage>no</ErrorMessage>")));
     std::vector<ACE_CString> hosts;
     const std::function<void()> calls[] = {

@@ -34,6 +34,8 @@ class HttpClientWorkflow : public HttpClientTest {
 protected:
     void answerNext(const std::string& body) { server().enqueue(ScriptedResponse::Ok(body)); }
 
+    const HttpConfigurationClient client = makeClient();  // every test's client
+
     // The message the last call posted, checking its path.
     std::string lastMessage() {
         const auto request = server().lastRequest();
@@ -54,7 +56,6 @@ protected:
 };
 
 TEST_F(HttpClientWorkflow, EachOperationSendsItsExactMessage) {
-    const HttpConfigurationClient client = makeClient();
     server().setDefault(ScriptedResponse::Ok(
         "<R><string>n9</string><lastModified>2010-03-04T05:06:07.0890000Z</lastModified>"
         "<dateTime>2010-03-04T05:06:07Z</dateTime><boolean>true</boolean><User></User>"
@@ -132,7 +133,6 @@ TEST_F(HttpClientWorkflow, EachOperationSendsItsExactMessage) {
 }
 
 TEST_F(HttpClientWorkflow, AnswersAreReadFromTheirElements) {
-    const HttpConfigurationClient client = makeClient();
     auto node = UwfNodeData::Create();
     BDateTime modified;
     answerNext(
@@ -167,7 +167,6 @@ TEST_F(HttpClientWorkflow, AnswersAreReadFromTheirElements) {
 }
 
 TEST_F(HttpClientWorkflow, RepeatedRecordsAreAppendedInOrder) {
-    const HttpConfigurationClient client = makeClient();
     std::vector<SmartPtr<UwfNodeData>> nodes(1, UwfNodeData::Create());
     answerNext("<A><Node><Id>a</Id><SubItems>3</SubItems></Node><Node><Id>b</Id></Node></A>");
     client.UwfGetFolderData("f", BDateTime(), nodes);
@@ -191,7 +190,6 @@ TEST_F(HttpClientWorkflow, RepeatedRecordsAreAppendedInOrder) {
 }
 
 TEST_F(HttpClientWorkflow, BooleanAnswersAcceptOnlyTrueAndFalse) {
-    const HttpConfigurationClient client = makeClient();
     const std::pair<std::string, std::string> cases[] = {
         {"<boolean>true</boolean>", "true"},
         {"<boolean>false</boolean>", "false"},
@@ -215,7 +213,6 @@ TEST_F(HttpClientWorkflow, BooleanAnswersAcceptOnlyTrueAndFalse) {
 }
 
 TEST_F(HttpClientWorkflow, MissingAnswerElementsHaveTheirTexts) {
-    const HttpConfigurationClient client = makeClient();
     auto node = UwfNodeData::Create();
     auto user = UwfUserData::Create();
     BDateTime modified;
@@ -243,7 +240,6 @@ std::string errorBody(const std::string& key, const std::string& code) {
 }
 
 TEST_F(HttpClientWorkflow, ServiceErrorsBecomeTheirExceptionClasses) {
-    const HttpConfigurationClient client = makeClient();
     const std::pair<ScriptedResponse, std::string> cases[] = {
         {ScriptedResponse::Status(404, errorBody("cf919ca8-84fe-4214-9343-c24f6e6b92b2", "")),
          typeid(HttpConfigurationInvalidNodeIdException).name()},
