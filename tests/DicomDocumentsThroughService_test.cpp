@@ -3,47 +3,28 @@
 // reads to; the DICOM client document also stores itself through the repository.
 #include <gtest/gtest.h>
 
-#include <fstream>
 #include <memory>
-#include <sstream>
 #include <string>
 
 #include "Configuration/ConfigurationRepository.h"
 #include "Configuration/DicomClientConfiguration.h"
 #include "Configuration/HttpConfigurationClient.h"
 #include "Configuration/SOPServiceConfiguration.h"
-#include "Configuration/StoredForm.h"
 #include "InProcessService.h"
-#include "Vesk/XmlUtils.h"
-#include "repository/HttpServiceConnection.h"
+#include "ThroughServiceSupport.h"
 
 namespace Configuration {
 namespace {
 
-Vesk::Element example(const char* file) {
-    std::ifstream in(std::string(QUORVEX_EXAMPLES) + "/dicom/" + file, std::ios::binary);
-    std::ostringstream text;
-    text << in.rdbuf();
-    Vesk::Element tree;
-    Vesk::XmlUtils::parse(text.str().data(), text.str().size(), tree);
-    return tree;
-}
-
 class DicomDocuments : public ::testing::Test {
 protected:
-    DicomDocuments() : client(service.address().c_str(), true, false) {
-        ServiceLocation location;
-        location.localServer = service.address().c_str();
-        location.servers["testhost"] = service.address();
-        repository = std::make_unique<ConfigurationRepository>(
-            std::make_shared<HttpServiceConnector>(location));
-    }
+    DicomDocuments()
+        : client(service.address().c_str(), true, false),
+          repository(ThroughService::repositoryAt(service.address())) {}
 
     // Stores tree as the site-wide document of doc's path, as an administrator's tool would.
     void store(const ConfigDoc& doc, const Vesk::Element& tree) {
-        const std::string bytes = StoredForm::encode(tree);
-        client.store("TestHost", doc.path().c_str(),
-                     reinterpret_cast<const unsigned char*>(bytes.data()), bytes.size(), "");
+        ThroughService::storeTree(client, "TestHost", doc.path(), tree);
     }
 
     ServiceTesting::InProcessService service;
@@ -52,7 +33,7 @@ protected:
 };
 
 TEST_F(DicomDocuments, SOPServicesReadThroughTheRepositoryResolveAsTheirXml) {
-    const Vesk::Element tree = example("SOPServiceConfiguration.xml");
+    const Vesk::Element tree = ThroughService::exampleDocument("dicom/SOPServiceConfiguration.xml");
     SOPServiceConfiguration direct;
     ASSERT_TRUE(direct.readVesk(tree));
     store(direct, tree);
@@ -77,7 +58,7 @@ TEST_F(DicomDocuments, SOPServicesReadThroughTheRepositoryResolveAsTheirXml) {
 }
 
 TEST_F(DicomDocuments, DicomClientStoredAndReadBack) {
-    const Vesk::Element tree = example("DicomClient.xml");
+    const Vesk::Element tree = ThroughService::exampleDocument("dicom/DicomClient.xml");
     DicomClientConfiguration direct;
     ASSERT_TRUE(direct.readVesk(tree));
     store(direct, tree);

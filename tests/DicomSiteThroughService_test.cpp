@@ -5,10 +5,8 @@
 // repository whichever of them is cached first.
 #include <gtest/gtest.h>
 
-#include <fstream>
 #include <functional>
 #include <memory>
-#include <sstream>
 #include <string>
 
 #include "Configuration/AutoExportConfiguration.h"
@@ -23,21 +21,14 @@
 #include "Configuration/QrscpConfiguration.h"
 #include "Configuration/SSCPConfiguration.h"
 #include "Configuration/StorageCommitConfiguration.h"
-#include "Configuration/StoredForm.h"
 #include "InProcessService.h"
-#include "Vesk/XmlUtils.h"
-#include "repository/HttpServiceConnection.h"
+#include "ThroughServiceSupport.h"
 
 namespace Configuration {
 namespace {
 
 Vesk::Element siteDocument(const std::string& name) {
-    std::ifstream in(std::string(QUORVEX_EXAMPLES) + "/site/" + name + ".xml", std::ios::binary);
-    std::ostringstream text;
-    text << in.rdbuf();
-    Vesk::Element tree;
-    Vesk::XmlUtils::parse(text.str().data(), text.str().size(), tree);
-    return tree;
+    return ThroughService::exampleDocument("site/" + name + ".xml");
 }
 
 // One document of the site: its class, and a check of the values that matter in it.
@@ -136,20 +127,14 @@ const SiteDocument kSite[] = {
 
 class DicomSite : public ::testing::Test {
 protected:
-    DicomSite() : client(service.address().c_str(), true, false) {
-        ServiceLocation location;
-        location.localServer = service.address().c_str();
-        location.servers["testhost"] = service.address();
-        repository = std::make_unique<ConfigurationRepository>(
-            std::make_shared<HttpServiceConnector>(location));
-    }
+    DicomSite()
+        : client(service.address().c_str(), true, false),
+          repository(ThroughService::repositoryAt(service.address())) {}
 
     // Stores every document of the site as bytes, as an administrator's tool would.
     void storeSite() {
         for (const SiteDocument& d : kSite) {
-            const std::string bytes = StoredForm::encode(siteDocument(d.name));
-            client.store("TestHost", d.make()->path().c_str(),
-                         reinterpret_cast<const unsigned char*>(bytes.data()), bytes.size(), "");
+            ThroughService::storeTree(client, "TestHost", d.make()->path(), siteDocument(d.name));
         }
     }
 
@@ -179,18 +164,15 @@ TEST_F(DicomSite, EveryDocumentReadsThroughTheRepositoryIntoItsClass) {
 TEST_F(DicomSite, GlobalExportSettingsAndTheirAdapterShareOneDocument) {
     storeSite();
     for (const bool adapterFirst : {false, true}) {
-        ServiceLocation location;
-        location.localServer = service.address().c_str();
-        location.servers["testhost"] = service.address();
-        ConfigurationRepository fresh(std::make_shared<HttpServiceConnector>(location));
+        const auto fresh = ThroughService::repositoryAt(service.address());
         KelExportGlobalConfiguration global;
         KelExportConfigurationAdapter adapter;
         if (adapterFirst) {
-            ASSERT_EQ(0, fresh.GetLatest(adapter));
-            ASSERT_EQ(0, fresh.GetLatest(global));
+            ASSERT_EQ(0, fresh->GetLatest(adapter));
+            ASSERT_EQ(0, fresh->GetLatest(global));
         } else {
-            ASSERT_EQ(0, fresh.GetLatest(global));
-            ASSERT_EQ(0, fresh.GetLatest(adapter));
+            ASSERT_EQ(0, fresh->GetLatest(global));
+            ASSERT_EQ(0, fresh->GetLatest(adapter));
         }
         EXPECT_EQ(48, adapter.getCommandStatusLifetime()) << adapterFirst;
         EXPECT_EQ(global.getMaximumNumberOfRetries(), adapter.getMaxNumberOfRetries());

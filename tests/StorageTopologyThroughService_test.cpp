@@ -4,21 +4,17 @@
 // of the active stack after the machine's change event.
 #include <gtest/gtest.h>
 
-#include <fstream>
 #include <memory>
-#include <sstream>
 #include <string>
 
 #include "ChildProcess.h"
 #include "Configuration/ConfigurationRepository.h"
 #include "Configuration/HttpConfigurationClient.h"
 #include "Configuration/MSMQCommonConfiguration.h"
-#include "Configuration/StoredForm.h"
 #include "Configuration/StrategyConfiguration.h"
 #include "Configuration/TopologySource.h"
 #include "InProcessService.h"
-#include "Vesk/XmlUtils.h"
-#include "repository/HttpServiceConnection.h"
+#include "ThroughServiceSupport.h"
 #include "testing/LogCapture.h"
 
 namespace Configuration {
@@ -32,12 +28,7 @@ std::string queueOf(const char* stack) {
 }
 
 Vesk::Element siteDocument(const std::string& name) {
-    std::ifstream in(std::string(QUORVEX_EXAMPLES) + "/site/" + name + ".xml", std::ios::binary);
-    std::ostringstream text;
-    text << in.rdbuf();
-    Vesk::Element tree;
-    Vesk::XmlUtils::parse(text.str().data(), text.str().size(), tree);
-    return tree;
+    return ThroughService::exampleDocument("site/" + name + ".xml");
 }
 
 // The queries' documents from this test's repository, the storage-stack hosts from the service.
@@ -59,15 +50,11 @@ class StorageSite : public ::testing::Test {
 protected:
     StorageSite() : client(service.address().c_str(), true, false) {
         for (const char* name : {"StrategyConfiguration", "Location", "MsmqCommon"}) {
-            const std::string bytes = StoredForm::encode(siteDocument(name));
-            client.store("TestHost", (std::string("BrimmetServer\\") + name).c_str(),
-                         reinterpret_cast<const unsigned char*>(bytes.data()), bytes.size(), "");
+            ThroughService::storeTree(client, "TestHost",
+                                      (std::string("BrimmetServer\\") + name).c_str(),
+                                      siteDocument(name));
         }
-        ServiceLocation location;
-        location.localServer = service.address().c_str();
-        location.servers["testhost"] = service.address();
-        repository = std::make_unique<ConfigurationRepository>(
-            std::make_shared<HttpServiceConnector>(location));
+        repository = ThroughService::repositoryAt(service.address());
         source = std::make_unique<ServiceTopology>(*repository, client);
         scoped = std::make_unique<ScopedTopologySource>(*source);
         EXPECT_EQ(repository->GetLatest(msmq), 0);

@@ -3,9 +3,7 @@
 // configuration service of each machine and read back through that machine's repository.
 #include <gtest/gtest.h>
 
-#include <fstream>
 #include <memory>
-#include <sstream>
 #include <string>
 
 #include "Configuration/ApplicationLocationConfiguration.h"
@@ -13,34 +11,23 @@
 #include "Configuration/HttpConfigurationClient.h"
 #include "Configuration/OrvelSystemCommonConfiguration.h"
 #include "Configuration/ProcessesAndServicesConfiguration.h"
-#include "Configuration/StoredForm.h"
 #include "InProcessService.h"
 #include "Quorvex/Host.h"
-#include "Vesk/XmlUtils.h"
-#include "repository/HttpServiceConnection.h"
+#include "ThroughServiceSupport.h"
 #include "testing/FakeMachine.h"
 
 namespace Configuration {
 namespace {
 
 Vesk::Element siteFile(const std::string& file) {
-    std::ifstream in(std::string(QUORVEX_EXAMPLES) + "/site/" + file, std::ios::binary);
-    std::ostringstream text;
-    text << in.rdbuf();
-    Vesk::Element tree;
-    Vesk::XmlUtils::parse(text.str().data(), text.str().size(), tree);
-    return tree;
+    return ThroughService::exampleDocument("site/" + file);
 }
 
 // One machine of the site: its service, its repository, and the site's documents in its store.
 struct Machine {
     explicit Machine(const char* host, const char* processesFile)
         : service(options(host)), client(service.address().c_str(), true, false) {
-        ServiceLocation location;
-        location.localServer = service.address().c_str();
-        location.servers[Quorvex::HostKey(host)] = service.address();
-        repository = std::make_unique<ConfigurationRepository>(
-            std::make_shared<HttpServiceConnector>(location));
+        repository = ThroughService::repositoryAt(service.address(), Quorvex::HostKey(host));
         put(host, OrvelSystemCommonConfiguration().path(), "OrvelSystemCommon.xml");
         put(host, ApplicationLocationConfiguration().path(), "ApplicationLocation.xml");
         put(host, ProcessesAndServicesConfiguration().path(), processesFile);
@@ -51,9 +38,7 @@ struct Machine {
         return o;
     }
     void put(const char* host, const ACE_CString& path, const char* file) {
-        const std::string bytes = StoredForm::encode(siteFile(file));
-        client.store(host, path, reinterpret_cast<const unsigned char*>(bytes.data()), bytes.size(),
-                     "");
+        ThroughService::storeTree(client, host, path, siteFile(file));
     }
 
     ServiceTesting::InProcessService service;
