@@ -30,8 +30,7 @@ std::map<std::string, std::uintmax_t> snapshot(const std::string& directory) {
 // A Store request: host, name and the elements that follow them.
 std::string storeBody(const std::string& host, const std::string& name,
                       const std::string& rest = "<Configuration>AA==</Configuration>") {
-    return "<Store><Host>" + host + "</Host><ConfigurationName>" + name + "</ConfigurationName>" +
-           rest + "</Store>";
+    return ServiceTesting::itemBody("Store", host, name, rest);
 }
 
 class BadInput : public ::testing::Test {

@@ -40,8 +40,8 @@ std::string docName(int writer, int index) {
 }
 
 std::string storeBody(const std::string& name, const std::string& bytes) {
-    return "<Store><Host>Crash</Host><ConfigurationName>" + name +
-           "</ConfigurationName><Configuration>" + base64(bytes) + "</Configuration></Store>";
+    return ServiceTesting::itemBody("Store", "Crash", name,
+                                    "<Configuration>" + base64(bytes) + "</Configuration>");
 }
 
 TEST(CrashSafety, AcknowledgedStoresSurviveSigkill) {

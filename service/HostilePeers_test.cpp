@@ -37,6 +37,7 @@ namespace {
 using Clock = std::chrono::steady_clock;
 using ServiceTesting::elementText;
 using ServiceTesting::HttpAnswer;
+using ServiceTesting::itemBody;
 using ServiceTesting::RawConnection;
 using std::chrono::milliseconds;
 
@@ -50,12 +51,6 @@ constexpr std::size_t kHuge = HOSTILE_HUGE_MIB * kMiB;  // a huge body of many t
 constexpr std::size_t kDocument = kHuge / 2;            // a huge document in one parameter
 const milliseconds kAnswerTime{5000};     // a good answer later than this counts as lost
 const milliseconds kDeadlineSlack{2500};  // after the request timeout, before a close is late
-
-std::string itemRequest(const std::string& operation, const std::string& host,
-                        const std::string& name, const std::string& rest = "") {
-    return "<" + operation + "><Host>" + host + "</Host><ConfigurationName>" + name +
-           "</ConfigurationName>" + rest + "</" + operation + ">";
-}
 
 double millisecondsSince(Clock::time_point start) {
     return std::chrono::duration<double, std::milli>(Clock::now() - start).count();
@@ -130,7 +125,7 @@ protected:
     static double timeGoodRequest() {
         const auto start = Clock::now();
         RawConnection connection(port());
-        connection.send(RawConnection::post(itemRequest("Exists", "h", "n"), kCookie));
+        connection.send(RawConnection::post(itemBody("Exists", "h", "n"), kCookie));
         const HttpAnswer answer = connection.readAnswer(kAnswerTime);
         if (answer.status != 200 || elementText(answer.body, "ReturnStatus") != "1") {
             return -1;
@@ -320,14 +315,13 @@ TEST_F(HostilePeers, SlowIdleAndGreedyPeersAreCutOffWhileOthersAreServed) {
         {"64 pipelined answers never read",
          [&] {
              const std::string document(256 * 1024, 'Q');
-             exchange(
-                 RawConnection::post(itemRequest("Store", "h", "big",
-                                                 "<Configuration>" + document + "</Configuration>"),
-                                     kCookie));
+             exchange(RawConnection::post(
+                 itemBody("Store", "h", "big", "<Configuration>" + document + "</Configuration>"),
+                 kCookie));
              RawConnection reader(port());
              std::string requests;
              for (int i = 0; i < 64; ++i) {
-                 requests += RawConnection::post(itemRequest("Retrieve", "h", "big"), kCookie);
+                 requests += RawConnection::post(itemBody("Retrieve", "h", "big"), kCookie);
              }
              reader.send(requests);
              const auto start = Clock::now();
@@ -419,10 +413,9 @@ TEST_F(HostilePeers, LargeAndUnauthenticatedBodiesAreRefusedEarlyAndCheaply) {
          [&] {
              const std::size_t before = ServiceTesting::residentBytes(pid());
              const std::string document(kDocument, 'B');
-             const HttpAnswer answer = exchange(
-                 RawConnection::post(itemRequest("Store", "h", "huge",
-                                                 "<Configuration>" + document + "</Configuration>"),
-                                     kCookie));
+             const HttpAnswer answer = exchange(RawConnection::post(
+                 itemBody("Store", "h", "huge", "<Configuration>" + document + "</Configuration>"),
+                 kCookie));
              EXPECT_EQ(elementText(answer.body, "ReturnStatus"), "1") << answer.body;
              std::this_thread::sleep_for(milliseconds(300));
              const std::size_t after = ServiceTesting::residentBytes(pid());
@@ -441,7 +434,7 @@ TEST_F(HostilePeers, LargeAndUnauthenticatedBodiesAreRefusedEarlyAndCheaply) {
 // What HTTP/1.1 asks of a server: pipelined requests in order, absolute-form targets, 405 with
 // Allow for other methods, clear refusals of malformed heads.
 TEST_F(HostilePeers, HttpIsSpokenAsHttp11Says) {
-    const std::string exists = RawConnection::post(itemRequest("Exists", "h", "n"), kCookie);
+    const std::string exists = RawConnection::post(itemBody("Exists", "h", "n"), kCookie);
     const auto raw = [](const std::string& request) { return exchange(request); };
     const auto withTarget = [](const std::string& method, const std::string& target) {
         return method + " " + target + " HTTP/1.1\r\nHost: 127.0.0.1\r\nCookie: " + kCookie +
@@ -452,7 +445,7 @@ TEST_F(HostilePeers, HttpIsSpokenAsHttp11Says) {
          [&] {
              RawConnection c(port());
              c.send(RawConnection::post("<GetHostName></GetHostName>", "") + exists +
-                    RawConnection::post(itemRequest("Retrieve", "h", "absent"), kCookie));
+                    RawConnection::post(itemBody("Retrieve", "h", "absent"), kCookie));
              std::string roots;
              for (int i = 0; i < 3; ++i) {
                  const std::string body = c.readAnswer(kAnswerTime).body;
@@ -506,7 +499,7 @@ TEST_F(HostilePeers, HttpIsSpokenAsHttp11Says) {
         {"100-continue with the ticket",
          [&] {
              RawConnection c(port());
-             const std::string body = itemRequest("Exists", "h", "n");
+             const std::string body = itemBody("Exists", "h", "n");
              c.send(std::string("POST ") + kPath + " HTTP/1.1\r\nHost: x\r\nCookie: " + kCookie +
                     "\r\nExpect: 100-continue\r\nContent-Length: " + std::to_string(body.size()) +
                     "\r\n\r\n");
@@ -544,23 +537,23 @@ TEST_F(HostilePeers, HostileXmlIsRefusedOrStoredSafely) {
                  doctype += "<!ENTITY l" + std::to_string(i) + " \"" + previous + previous +
                             previous + previous + "\">";
              }
-             const HttpAnswer answer = post(doctype + "]>" + itemRequest("Exists", "&l9;", "&l9;"));
+             const HttpAnswer answer = post(doctype + "]>" + itemBody("Exists", "&l9;", "&l9;"));
              EXPECT_LT(answer.body.size(), 4096u);
              return statusText(answer) + ", " + std::to_string(answer.body.size()) + " bytes";
          }},
         {"invalid UTF-8 in names",
          [&] {
              const std::string name = "bad\xff\xfe\xc0\x80name";
-             post(itemRequest("Store", "h\xff", name, "<Configuration>AA==</Configuration>"));
-             const HttpAnswer got = post(itemRequest("Retrieve", "h\xff", name));
+             post(itemBody("Store", "h\xff", name, "<Configuration>AA==</Configuration>"));
+             const HttpAnswer got = post(itemBody("Retrieve", "h\xff", name));
              EXPECT_EQ(elementText(got.body, "Configuration"), "AA==") << got.body;
              return "stored, read back " + elementText(got.body, "ReturnStatus");
          }},
         {"NUL bytes in names",
          [&] {
              const HttpAnswer answer =
-                 post(itemRequest("Store", std::string("h\0x", 3), std::string("n\0", 2),
-                                  "<Configuration>AA==</Configuration>"));
+                 post(itemBody("Store", std::string("h\0x", 3), std::string("n\0", 2),
+                               "<Configuration>AA==</Configuration>"));
              EXPECT_NE(elementText(answer.body, "ReturnStatus"), "1") << answer.body;
              return statusText(answer) + ", ReturnStatus " +
                     elementText(answer.body, "ReturnStatus");

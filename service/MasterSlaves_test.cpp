@@ -14,6 +14,7 @@ namespace ConfigurationService {
 namespace {
 
 using ServiceTesting::elementText;
+using ServiceTesting::itemBody;
 using ServiceTesting::ServiceProcess;
 
 const char kCookie[] = "OrvelWebApplication=site-ticket";
@@ -32,16 +33,9 @@ std::string post(const ServiceProcess& service, const std::string& body) {
     return ServiceTesting::rawPost(service.port(), body, kCookie).body;
 }
 
-std::string itemBody(const std::string& operation, const std::string& host,
-                     const std::string& name) {
-    return "<" + operation + "><Host>" + host + "</Host><ConfigurationName>" + name +
-           "</ConfigurationName></" + operation + ">";
-}
-
 std::string storeBody(const std::string& operation, const std::string& host,
                       const std::string& name, const std::string& base64) {
-    return "<" + operation + "><Host>" + host + "</Host><ConfigurationName>" + name +
-           "</ConfigurationName><Configuration>" + base64 + "</Configuration></" + operation + ">";
+    return itemBody(operation, host, name, "<Configuration>" + base64 + "</Configuration>");
 }
 
 class MasterSlaves : public ::testing::Test {

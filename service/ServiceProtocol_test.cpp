@@ -15,26 +15,15 @@ namespace {
 
 using ServiceTesting::elementText;
 using ServiceTesting::InProcessService;
+using ServiceTesting::itemBody;
 using ServiceTesting::RawAnswer;
 
 RawAnswer post(const InProcessService& service, const std::string& body) {
     return ServiceTesting::rawPost(service.port(), body, InProcessService::ticketCookie());
 }
 
-std::string storeBody(const std::string& host, const std::string& name, const std::string& base64,
-                      const std::string& time = "") {
-    std::string body = "<Store><Host>" + host + "</Host><ConfigurationName>" + name +
-                       "</ConfigurationName><Configuration>" + base64 + "</Configuration>";
-    if (!time.empty()) {
-        body += "<LastModifiedTime>" + time + "</LastModifiedTime>";
-    }
-    return body + "</Store>";
-}
-
-std::string itemBody(const std::string& operation, const std::string& host,
-                     const std::string& name) {
-    return "<" + operation + "><Host>" + host + "</Host><ConfigurationName>" + name +
-           "</ConfigurationName></" + operation + ">";
+std::string storeBody(const std::string& host, const std::string& name, const std::string& base64) {
+    return itemBody("Store", host, name, "<Configuration>" + base64 + "</Configuration>");
 }
 
 // Guards against two quick stores sharing a timestamp, which would hide the second change.

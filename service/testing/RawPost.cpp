@@ -34,4 +34,10 @@ std::string elementText(const std::string& text, const std::string& tag) {
     return text.substr(start + open.size(), end - start - open.size());
 }
 
+std::string itemBody(const std::string& operation, const std::string& host, const std::string& name,
+                     const std::string& rest) {
+    return "<" + operation + "><Host>" + host + "</Host><ConfigurationName>" + name +
+           "</ConfigurationName>" + rest + "</" + operation + ">";
+}
+
 }  // namespace ServiceTesting

@@ -17,6 +17,11 @@ RawAnswer rawPost(
     int port, const std::string& body, const std::string& cookie,
     const std::string& path = "/Sundrel/ConfigurationService/ConfigurationService.ashx");
 
+// An item request: <operation><Host>host</Host><ConfigurationName>name</ConfigurationName>, then
+// rest as given, then the closing tag.
+std::string itemBody(const std::string& operation, const std::string& host, const std::string& name,
+                     const std::string& rest = "");
+
 // The text of the first <tag>...</tag> in text, or "<none>".
 std::string elementText(const std::string& text, const std::string& tag);
 
