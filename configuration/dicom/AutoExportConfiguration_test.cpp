@@ -9,13 +9,8 @@
 namespace Configuration {
 namespace {
 
+using Testing::parsed;
 using Testing::sampleDocument;
-
-Vesk::Element parsed(const std::string& xml) {
-    Vesk::Element tree;
-    Vesk::XmlUtils::parse(xml.data(), xml.size(), tree);
-    return tree;
-}
 
 // A document whose rules are the given XML.
 Vesk::Element withRules(const std::string& rules) {

@@ -6,25 +6,16 @@
 
 #include <fstream>
 #include <map>
-#include <sstream>
 #include <string>
 
 #include "Configuration/DicomClientConfiguration.h"
 #include "Configuration/SOPServiceConfiguration.h"
 #include "DicomTestSupport.h"
-#include "Vesk/XmlUtils.h"
 
 namespace Configuration {
 namespace {
 
 const char kInstalledTable[] = "/usr/include/dcmtk/dcmdata/dcuid.h";
-
-std::string fileText(const std::string& path) {
-    std::ifstream in(path, std::ios::binary);
-    std::ostringstream text;
-    text << in.rdbuf();
-    return text.str();
-}
 
 // Adds the UID of a line "#define UID_<name> "<uid>"" (a literal UID only) to uids.
 void addDefinedUid(const std::string& line, std::map<std::string, std::string>& uids) {
@@ -77,10 +68,8 @@ void expectStandard(const ACE_CString& uid, const std::string& kind, const char*
 
 template <class T>
 T readExample(const char* file) {
-    const std::string xml =
-        fileText(std::string(QUORVEX_TEST_DATA) + "/../../examples/dicom/" + file);
-    Vesk::Element tree;
-    Vesk::XmlUtils::parse(xml.data(), xml.size(), tree);
+    const Vesk::Element tree = Testing::parsed(
+        Testing::fileText(std::string(QUORVEX_TEST_DATA) + "/../../examples/dicom/" + file));
     T document;
     EXPECT_TRUE(document.readVesk(tree)) << file;
     return document;

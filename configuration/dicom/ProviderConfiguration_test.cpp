@@ -11,14 +11,9 @@
 namespace Configuration {
 namespace {
 
+using Testing::parsed;
 using Testing::sampleDocument;
 using Testing::withChild;
-
-Vesk::Element parsed(const std::string& xml) {
-    Vesk::Element tree;
-    Vesk::XmlUtils::parse(xml.data(), xml.size(), tree);
-    return tree;
-}
 
 // A "DicomSources" element holding sources; a source named "no model" lacks "Model".
 Vesk::Element sources(std::initializer_list<const char*> names) {

@@ -1,5 +1,5 @@
-// Test helpers for element trees: a class's sample document from tests/data/classes, and copies
-// of an element without, or with another, child of one key.
+// Test helpers for element trees: a file's text, an XML text's tree, a class's sample document
+// from tests/data/classes, and copies of an element without, or with another, child of one key.
 #pragma once
 
 #include <fstream>
@@ -12,14 +12,24 @@
 namespace Configuration {
 namespace Testing {
 
-// The tree of tests/data/classes/file.
-inline Vesk::Element sampleDocument(const std::string& file) {
-    std::ifstream in(std::string(QUORVEX_TEST_DATA) + "/classes/" + file, std::ios::binary);
+// The bytes of the file at path ("" when it cannot be read).
+inline std::string fileText(const std::string& path) {
+    std::ifstream in(path, std::ios::binary);
     std::ostringstream text;
     text << in.rdbuf();
+    return text.str();
+}
+
+// The tree of an XML text.
+inline Vesk::Element parsed(const std::string& xml) {
     Vesk::Element tree;
-    Vesk::XmlUtils::parse(text.str().data(), text.str().size(), tree);
+    Vesk::XmlUtils::parse(xml.data(), xml.size(), tree);
     return tree;
+}
+
+// The tree of tests/data/classes/file.
+inline Vesk::Element sampleDocument(const std::string& file) {
+    return parsed(fileText(std::string(QUORVEX_TEST_DATA) + "/classes/" + file));
 }
 
 // A copy of element without its children of that key.

@@ -5,13 +5,12 @@
 
 #include <gtest/gtest.h>
 
-#include <fstream>
 #include <map>
 #include <set>
-#include <sstream>
 
 #include "Configuration/AnonParam.h"
 #include "ConventionSample.h"
+#include "ElementTestSupport.h"
 #include "Vesk/XmlUtils.h"
 #include "testing/LogCapture.h"
 
@@ -19,8 +18,10 @@ namespace Configuration {
 namespace {
 
 using Testing::Convention;
+using Testing::fileText;
 using Testing::Hop;
 using Testing::Kind;
+using Testing::parsed;
 
 AnonParam param(const char* tag, const char* value) {
     AnonParam p;
@@ -69,22 +70,10 @@ Convention filled() {
     return c;
 }
 
-std::string dataFile(const char* name) {
-    std::ifstream in(std::string(QUORVEX_TEST_DATA) + "/fields/" + name, std::ios::binary);
-    std::ostringstream text;
-    text << in.rdbuf();
-    return text.str();
-}
-
-Vesk::Element parsed(const std::string& xml) {
-    Vesk::Element tree;
-    Vesk::XmlUtils::parse(xml.data(), xml.size(), tree);
-    return tree;
-}
-
 // The written form of every field, pinned.
 const Vesk::Element& sample() {
-    static const Vesk::Element tree = parsed(dataFile("Convention.xml"));
+    static const Vesk::Element tree =
+        parsed(fileText(std::string(QUORVEX_TEST_DATA) + "/fields/Convention.xml"));
     return tree;
 }
 
