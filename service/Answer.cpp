@@ -1,9 +1,9 @@
 // Answer texts written element by element, with text escaped.
 #include "Answer.h"
 
-#include "Base64Text.h"
-
 #include <algorithm>
+
+#include "Quorvex/Base64Coder.h"
 
 namespace ConfigurationService {
 namespace {
@@ -53,7 +53,7 @@ Answer& Answer::base64(const std::string& tag, const void* data, std::size_t len
     const auto* bytes = static_cast<const unsigned char*>(data);
     for (std::size_t at = 0; at < length; at += kChunk) {
         const std::size_t n = std::min(kChunk, length - at);
-        m_text.append(encoded, Base64Text::encode(bytes + at, n, encoded));
+        m_text.append(encoded, Base64Coder::EncodeInto(bytes + at, n, encoded));
     }
     return close(tag);
 }
@@ -126,7 +126,7 @@ std::size_t Answer::elementSize(const std::string& tag, const char* text, std::s
 }
 
 std::size_t Answer::base64ElementSize(const std::string& tag, std::size_t length) {
-    return plainElementSize(tag, Base64Text::encodedLength(length));
+    return plainElementSize(tag, Base64Coder::EncodedLength(length));
 }
 
 }  // namespace ConfigurationService

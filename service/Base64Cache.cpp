@@ -1,15 +1,15 @@
 // Base64 texts of large documents, kept while their bytes live.
 #include "Base64Cache.h"
 
-#include "Base64Text.h"
+#include "Quorvex/Base64Coder.h"
 
 namespace ConfigurationService {
 namespace {
 
 std::shared_ptr<const std::string> encode(const std::string& bytes) {
-    auto text = std::make_shared<std::string>(Base64Text::encodedLength(bytes.size()), '\0');
-    Base64Text::encode(reinterpret_cast<const unsigned char*>(bytes.data()), bytes.size(),
-                       &(*text)[0]);
+    auto text = std::make_shared<std::string>(Base64Coder::EncodedLength(bytes.size()), '\0');
+    Base64Coder::EncodeInto(reinterpret_cast<const unsigned char*>(bytes.data()), bytes.size(),
+                            &(*text)[0]);
     return text;
 }
 

@@ -12,6 +12,11 @@ class Base64Coder {
 public:
     // The Base64 text of len bytes.
     static ACE_CString Encode(const unsigned char* data, std::size_t len);
+    // The length of the Base64 text of len bytes.
+    static std::size_t EncodedLength(std::size_t len) { return (len + 2) / 3 * 4; }
+    // Writes the Base64 text of len bytes to out (room for EncodedLength(len) characters);
+    // returns its length.
+    static std::size_t EncodeInto(const unsigned char* data, std::size_t len, char* out);
     // Decodes text; the caller owns the bytes (length in outLen). Spaces, tabs, CR and LF are
     // skipped wherever they stand; any other character outside the alphabet, bad padding or a
     // count of the other characters that is not a multiple of four throw std::invalid_argument

@@ -7,6 +7,7 @@
 #include <array>
 #include <cstdint>
 #include <cstdio>
+#include <cstring>
 #include <iterator>
 #include <stdexcept>
 #include <string>
@@ -31,6 +32,23 @@ constexpr DecodeTable makeDecodeTable() {
 }
 
 constexpr DecodeTable kDecode = makeDecodeTable();
+
+// The two characters of every 12-bit group: the encoder makes half the look-ups of one
+// character at a time.
+struct PairTable {
+    char pairs[4096][2];
+    PairTable() {
+        for (unsigned v = 0; v < 4096; ++v) {
+            pairs[v][0] = kAlphabet[v >> 6];
+            pairs[v][1] = kAlphabet[v & 63];
+        }
+    }
+};
+
+const PairTable& pairTable() {
+    static const PairTable table;
+    return table;
+}
 
 // ASCII blanks and line breaks, which wrapped Base64 carries between its characters.
 bool isBlank(char c) {
@@ -153,26 +171,30 @@ bool decodeCompact(const char* text, std::size_t len, Quorvex::ByteArray& bytes,
 }  // namespace
 
 ACE_CString Base64Coder::Encode(const unsigned char* data, std::size_t len) {
-    std::string out((len + 2) / 3 * 4, '=');
-    char* o = &out[0];
+    std::string out(EncodedLength(len), '\0');
+    EncodeInto(data, len, &out[0]);
+    return ACE_CString(out.data(), out.size());
+}
+
+std::size_t Base64Coder::EncodeInto(const unsigned char* data, std::size_t len, char* out) {
+    const PairTable& table = pairTable();
+    char* const start = out;
     std::size_t i = 0;
-    for (; i + 3 <= len; i += 3, o += 4) {
+    for (; i + 3 <= len; i += 3, out += 4) {
         const std::uint32_t v = (std::uint32_t{data[i]} << 16) | (data[i + 1] << 8) | data[i + 2];
-        o[0] = kAlphabet[v >> 18];
-        o[1] = kAlphabet[(v >> 12) & 63];
-        o[2] = kAlphabet[(v >> 6) & 63];
-        o[3] = kAlphabet[v & 63];
+        std::memcpy(out, table.pairs[v >> 12], 2);
+        std::memcpy(out + 2, table.pairs[v & 0xfff], 2);
     }
     if (i < len) {
         const bool two = i + 1 < len;
         const std::uint32_t v = (std::uint32_t{data[i]} << 16) | (two ? data[i + 1] << 8 : 0);
-        o[0] = kAlphabet[v >> 18];
-        o[1] = kAlphabet[(v >> 12) & 63];
-        if (two) {
-            o[2] = kAlphabet[(v >> 6) & 63];
-        }
+        out[0] = kAlphabet[v >> 18];
+        out[1] = kAlphabet[(v >> 12) & 63];
+        out[2] = two ? kAlphabet[(v >> 6) & 63] : '=';
+        out[3] = '=';
+        out += 4;
     }
-    return ACE_CString(out.data(), out.size());
+    return static_cast<std::size_t>(out - start);
 }
 
 Quorvex::ByteArray Base64Coder::Decode(const char* given, std::size_t givenLength,
