@@ -12,6 +12,7 @@
 
 #include "Client/ServiceTicketModule.h"
 #include "Configuration/ErrorData.h"
+#include "Configuration/HttpConfigurationException.h"
 #include "Configuration/HttpConfigurationFolderLimitReachedException.h"
 #include "Configuration/HttpConfigurationInvalidNodeIdException.h"
 #include "Configuration/HttpConfigurationItemLimitReachedException.h"
@@ -162,6 +163,15 @@ bool locateElementText(std::string_view text, std::string_view tag, std::size_t 
     }
     raw = text.substr(valueStart, closeAt - valueStart);
     return true;
+}
+
+ACE_CString requiredElementText(const char* tag, const ACE_CString& answer, const char* missing) {
+    ACE_CString value;
+    ACE_CString::size_type next = 0;
+    if (!HttpConfigurationClient::findElementText(tag, answer, 0, value, next)) {
+        throw HttpConfigurationException(missing);
+    }
+    return value;
 }
 
 bool HttpConfigurationClient::findElementText(const ACE_CString& tag, const ACE_CString& text,

@@ -56,16 +56,6 @@ ACE_CString storeBody(const char* root, const ACE_CString& host,
     return element(root, inner);
 }
 
-// The text of element tag of an answer; HttpConfigurationException(missing) when absent.
-ACE_CString requiredElement(const char* tag, const ACE_CString& answer, const char* missing) {
-    ACE_CString value;
-    ACE_CString::size_type next = 0;
-    if (!Client::findElementText(tag, answer, 0, value, next)) {
-        throw HttpConfigurationException(missing);
-    }
-    return value;
-}
-
 // The document of a retrieve answer: its Base64 text decoded where it stands in the answer (a
 // document's text holds no entity; one that does is read through findElementText like any text).
 Quorvex::ByteArray decodeDocument(const ACE_CString& answer, const char* missing,
@@ -76,7 +66,7 @@ Quorvex::ByteArray decodeDocument(const ACE_CString& answer, const char* missing
         std::memchr(raw.data(), '&', raw.size()) == nullptr) {
         return Base64Coder::Decode(raw.data(), raw.size(), length);
     }
-    return Base64Coder::Decode(requiredElement(Client::ELEMENT_CONFIGURATION, answer, missing),
+    return Base64Coder::Decode(requiredElementText(Client::ELEMENT_CONFIGURATION, answer, missing),
                                length);
 }
 
@@ -153,8 +143,8 @@ void HttpConfigurationClient::checkForExistence(const ACE_CString& host,
                      const ACE_CString answer =
                          sendConfiguration(element("Exists", hostAndName(host, configurationName)));
                      const ACE_CString value =
-                         requiredElement(ELEMENT_CONFIGURATION_EXISTS, answer,
-                                         "ConfigurationExists not found in response");
+                         requiredElementText(ELEMENT_CONFIGURATION_EXISTS, answer,
+                                             "ConfigurationExists not found in response");
                      exists = ACE_OS::strcasecmp(value.c_str(), "1") == 0;
                  });
 }
@@ -167,8 +157,8 @@ void HttpConfigurationClient::getTimeStamp(const ACE_CString& host,
                      const ACE_CString answer = sendConfiguration(
                          element("GetLastModifiedTime", hostAndName(host, configurationName)));
                      timestamp =
-                         BDateTime(requiredElement(ELEMENT_LAST_MODIFIED_TIME, answer,
-                                                   "Last modified time not found in response"));
+                         BDateTime(requiredElementText(ELEMENT_LAST_MODIFIED_TIME, answer,
+                                                       "Last modified time not found in response"));
                  });
 }
 
@@ -191,14 +181,14 @@ void HttpConfigurationClient::listItems(const ACE_CString& host,
     ACE_CString::size_type position = 0;
     while (findElementText(ELEMENT_CONFIGURATION_ITEM, answer, position, item, position)) {
         _HttpConfigurationItemInfo info;
-        info.host = requiredElement(ELEMENT_HOST_NAME, item,
-                                    "HttpConfigurationClient::listItems host not found");
+        info.host = requiredElementText(ELEMENT_HOST_NAME, item,
+                                        "HttpConfigurationClient::listItems host not found");
         info.configurationName =
-            requiredElement(ELEMENT_CONFIGURATION_NAME, item,
-                            "HttpConfigurationClient::listItems configurationName not found");
+            requiredElementText(ELEMENT_CONFIGURATION_NAME, item,
+                                "HttpConfigurationClient::listItems configurationName not found");
         info.lastModifiedTime =
-            requiredElement(ELEMENT_LAST_MODIFIED_TIME, item,
-                            "HttpConfigurationClient::listItems lastModifiedTime not found");
+            requiredElementText(ELEMENT_LAST_MODIFIED_TIME, item,
+                                "HttpConfigurationClient::listItems lastModifiedTime not found");
         items.push_back(info);
     }
 }

@@ -11,6 +11,7 @@
 #include "Quorvex/BDateTime.h"
 #include "Quorvex/OutputMemStream.h"
 #include "Vesk/XmlEmitter.h"
+#include "client/ElementText.h"
 
 namespace Configuration {
 
@@ -62,19 +63,9 @@ ACE_CString typeText(UwfNodeData::NodeType type) {
     return type == UwfNodeData::Folder ? "0" : "1";
 }
 
-// The text of element tag of answer; HttpConfigurationException(missing) when absent.
-ACE_CString answerElement(const char* tag, const ACE_CString& answer, const char* missing) {
-    ACE_CString value;
-    ACE_CString::size_type next = 0;
-    if (!Client::findElementText(tag, answer, 0, value, next)) {
-        throw HttpConfigurationException(missing);
-    }
-    return value;
-}
-
 // A "boolean" answer: exactly "true" or "false".
 bool booleanAnswer(const ACE_CString& answer) {
-    const ACE_CString value = answerElement("boolean", answer, NO_RESPONSE_ELEMENT);
+    const ACE_CString value = requiredElementText("boolean", answer, NO_RESPONSE_ELEMENT);
     if (value == "true") {
         return true;
     }
@@ -108,15 +99,15 @@ ACE_CString HttpConfigurationClient::sendWorkflow(const ACE_CString& body) const
 ACE_CString HttpConfigurationClient::UwfCreateNode(const UwfNodeData& node,
                                                    BDateTime& lastModified) const {
     const ACE_CString answer = sendWorkflow(nodeBody("CreateNode", node));
-    const ACE_CString id = answerElement("string", answer, NO_RESPONSE_ELEMENT);
-    lastModified = Convert::ToBDateTime(
-        answerElement("lastModified", answer, "Unable to find lastModified output parameter"));
+    const ACE_CString id = requiredElementText("string", answer, NO_RESPONSE_ELEMENT);
+    lastModified = Convert::ToBDateTime(requiredElementText(
+        "lastModified", answer, "Unable to find lastModified output parameter"));
     return id;
 }
 
 BDateTime HttpConfigurationClient::UwfUpdateNode(const UwfNodeData& node) const {
     const ACE_CString answer = sendWorkflow(nodeBody("UpdateNode", node));
-    return Convert::ToBDateTime(answerElement("dateTime", answer, NO_RESPONSE_ELEMENT));
+    return Convert::ToBDateTime(requiredElementText("dateTime", answer, NO_RESPONSE_ELEMENT));
 }
 
 void HttpConfigurationClient::UwfDeleteNode(const ACE_CString& nodeId, const ACE_CString& userId,
@@ -154,7 +145,7 @@ void HttpConfigurationClient::UwfPurgeFolder(const ACE_CString& folderId, int it
 
 void HttpConfigurationClient::UwfGetUserStatus(const ACE_CString& userId, UwfUserData& user) const {
     const ACE_CString answer = sendWorkflow(requestBody("GetUserStatus", {{"userId", userId}}));
-    user.LoadXml(answerElement("User", answer, UNPARSABLE_RESPONSE));
+    user.LoadXml(requiredElementText("User", answer, UNPARSABLE_RESPONSE));
 }
 
 void HttpConfigurationClient::UwfUpdateUserStatus(const UwfUserData& user) const {
@@ -191,14 +182,14 @@ ACE_CString HttpConfigurationClient::UwfRetrievePreference(const ACE_CString& us
     const ACE_CString answer =
         sendWorkflow(requestBody("RetrievePreference", {{"userId", userId}, {"path", path}}));
     const ACE_CString inner =
-        answerElement("RetrievePreferenceResponse", answer, NO_RESPONSE_ELEMENT);
-    return answerElement("string", inner, NO_RESPONSE_ELEMENT);
+        requiredElementText("RetrievePreferenceResponse", answer, NO_RESPONSE_ELEMENT);
+    return requiredElementText("string", inner, NO_RESPONSE_ELEMENT);
 }
 
 ACE_CString HttpConfigurationClient::UwfRetrieveAllPreferences(const ACE_CString& userIds) const {
     const ACE_CString answer =
         sendWorkflow(requestBody("RetrievePreferences", {{"userIds", userIds}}));
-    return answerElement("RetrievePreferencesResponse", answer, NO_RESPONSE_ELEMENT);
+    return requiredElementText("RetrievePreferencesResponse", answer, NO_RESPONSE_ELEMENT);
 }
 
 void HttpConfigurationClient::UwfGetFolderData(const ACE_CString& folderId,
